@@ -1,0 +1,370 @@
+#include "app/frmMain.h"
+
+#include "app/MenuIcons.h"
+#include "library/RomListModel.h"
+#include "library/Search.h"
+#include "platform/Dialogs.h"
+#include "platform/FileSystem.h"
+#include "platform/Platform.h"
+#include "platform/SettingsStore.h"
+#include "settings/frmSettings.h"
+#include "ui/ListView.h"
+#include "ui/OleColor.h"
+#include "ui/Twips.h"
+
+#include <QApplication>
+#include <QCloseEvent>
+#include <QGroupBox>
+#include <QHeaderView>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMenuBar>
+#include <QProgressBar>
+
+#include <cmath>
+
+namespace {
+
+const QString kSettings = QStringLiteral("Settings");
+const QString kWinpos = QStringLiteral("winpos");
+
+// The store's keys of ROM folder n: ROMPath, ROM2Path, ROM3Path, ...
+QString folderKey(int n, const char* suffix) {
+    return QStringLiteral("ROM") + (n == 1 ? QString() : QString::number(n)) +
+           QLatin1String(suffix);
+}
+
+} // namespace
+
+frmMain::frmMain(Platform& platform) : m_platform(platform) {
+    setObjectName(QStringLiteral("frmMain"));
+    setWindowTitle(QStringLiteral("lum"));
+    createControls();
+    createMenus();
+}
+
+frmMain::~frmMain() = default;
+
+void frmMain::createControls() {
+    auto* central = new QWidget(this);
+    central->setObjectName(QStringLiteral("centralWidget"));
+    setCentralWidget(central);
+
+    fraSelectRom = new QGroupBox(QStringLiteral("Double Click on ROM to load it..."), central);
+    fraSelectRom->setObjectName(QStringLiteral("fraSelectRom"));
+    vbalListViewCtl1 = new ListView(fraSelectRom);
+    vbalListViewCtl1->setObjectName(QStringLiteral("vbalListViewCtl1"));
+    m_listModel = new RomListModel(this);
+    vbalListViewCtl1->setModel(m_listModel);
+
+    fraSearch = new QGroupBox(QStringLiteral("Only show filenames containing..."), central);
+    fraSearch->setObjectName(QStringLiteral("fraSearch"));
+    txtSearch = new QLineEdit(fraSearch);
+    txtSearch->setObjectName(QStringLiteral("txtSearch"));
+    vbalProgressBar1 = new QProgressBar(fraSearch);
+    vbalProgressBar1->setObjectName(QStringLiteral("vbalProgressBar1"));
+    vbalProgressBar1->setTextVisible(true);
+    vbalProgressBar1->setAlignment(Qt::AlignCenter);
+    vbalProgressBar1->hide();
+
+    picBack = new QLabel(central);
+    picBack->setObjectName(QStringLiteral("picBack"));
+    picBack->hide();
+
+    m_settings = std::make_unique<frmSettings>(m_platform);
+}
+
+void frmMain::createMenus() {
+    auto item = [this](QMenu* menu, const char* name, const char* caption) {
+        QAction* action = menu->addAction(QString::fromUtf8(caption));
+        action->setObjectName(QLatin1String(name));
+        return action;
+    };
+    auto menu = [](QMenu* m, const char* name) {
+        m->setObjectName(QLatin1String(name));
+        m->menuAction()->setObjectName(QLatin1String(name));
+        return m;
+    };
+    auto separator = [](QMenu* m, const char* name) {
+        m->addSeparator()->setObjectName(QLatin1String(name));
+    };
+
+    mnuFile = menu(menuBar()->addMenu(QStringLiteral("&File")), "mnuFile");
+    mnuFileLoadSettings = item(mnuFile, "mnuFileLoadSettings", "&Load Settings");
+    mnuFileSaveSettings = item(mnuFile, "mnuFileSaveSettings", "&Save Settings");
+    separator(mnuFile, "mnuBar3");
+    mnuFileExit = item(mnuFile, "mnuFileExit", "E&xit");
+
+    mnuSettings = menu(menuBar()->addMenu(QStringLiteral("&Settings")), "mnuSettings");
+    mnuSettingsConfiguration = item(mnuSettings, "mnuSettingsConfiguration", "&Configuration");
+    separator(mnuSettings, "mnuBar1");
+    mnuTextColor = item(mnuSettings, "mnuTextColor", "&Text Color");
+    mnuBackImg = menu(mnuSettings->addMenu(QStringLiteral("&Background")), "mnuBackImg");
+    mnuBackImgChange = item(mnuBackImg, "mnuBackImgChange", "Change Background &Image");
+    mnuBackColorChange = item(mnuBackImg, "mnuBackColorChange", "Change Background &Color");
+    separator(mnuBackImg, "mnuBar2");
+    mnuBackImgEnabled = item(mnuBackImg, "mnuBackImgEnabled", "Background Image &Enabled");
+    mnuBackImgEnabled->setCheckable(true);
+
+    mnuAbout = menu(menuBar()->addMenu(QStringLiteral("&About")), "mnuAbout");
+    mnuAboutz26Readme = item(mnuAbout, "mnuAboutz26Readme", "z26 &Readme");
+    mnuAboutCopying = item(mnuAbout, "mnuAboutCopying", "&Copying");
+    mnuAboutz26HomePage = item(mnuAbout, "mnuAboutz26HomePage", "&z26 HomePage");
+    separator(mnuAbout, "mnuBar4");
+    mnuAboutlumAbout = item(mnuAbout, "mnuAboutlumAbout", "&About lum");
+    mnuAboutlumHomePage = item(mnuAbout, "mnuAboutlumHomePage", "&lum HomePage");
+
+    mnuMainPopup = new QMenu(QStringLiteral("MainPopup"), this);
+    mnuMainPopup->setObjectName(QStringLiteral("mnuMainPopup"));
+    mnuMainRefresh = item(mnuMainPopup, "mnuMainRefresh", "Refresh");
+    mnuMainGameInfo = item(mnuMainPopup, "mnuMainGameInfo", "Game Info");
+    mnuMainGameInfo->setVisible(false);
+
+    connect(mnuFileExit, &QAction::triggered, this, &frmMain::mnuFileExit_Click);
+    connect(mnuSettingsConfiguration, &QAction::triggered, this,
+            &frmMain::mnuSettingsConfiguration_Click);
+    connect(mnuMainRefresh, &QAction::triggered, this, &frmMain::mnuMainRefresh_Click);
+
+    // Commands whose work is not part of the program yet stay visible but disabled.
+    for (QAction* pending :
+         {mnuFileLoadSettings, mnuFileSaveSettings, mnuTextColor, mnuBackImgChange,
+          mnuBackColorChange, mnuBackImgEnabled, mnuAboutz26Readme, mnuAboutCopying,
+          mnuAboutz26HomePage, mnuAboutlumAbout, mnuAboutlumHomePage, mnuMainGameInfo})
+        pending->setEnabled(false);
+}
+
+void frmMain::assignMenuIcons() {
+    const std::pair<QAction*, int> icons[] = {
+        {mnuFileExit, 3},          {mnuFileLoadSettings, 9},
+        {mnuFileSaveSettings, 10}, {mnuSettingsConfiguration, 0},
+        {mnuTextColor, 4},         {mnuBackImg->menuAction(), 1},
+        {mnuBackImgChange, 1},     {mnuAboutz26Readme, 5},
+        {mnuAboutz26HomePage, 7},  {mnuAboutlumAbout, 5},
+        {mnuAboutlumHomePage, 8},
+    };
+    for (const auto& [action, index] : icons)
+        action->setIcon(menuIcon(index));
+}
+
+void frmMain::Form_Load() {
+    assignMenuIcons();
+
+    const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
+    if (!FileExist(defaultFile)) {
+        m_settings->lblConfig->setText(QStringLiteral("Default.lum couldn't be loaded"));
+        m_settings->lblConfig->setToolTip(
+            QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));
+    }
+
+    SettingsStore& store = m_platform.store;
+    File1.setPattern(store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.*")));
+
+    const double height = readSingle(store, kWinpos, QStringLiteral("height"), 6570);
+    const double width = readSingle(store, kWinpos, QStringLiteral("width"), 4905);
+    const double top = readSingle(store, kWinpos, QStringLiteral("top"), 500);
+    const double left = readSingle(store, kWinpos, QStringLiteral("left"), 500);
+    resize(twips::toPixelsX(width), twips::toPixelsY(height));
+    move(twips::toPixelsX(left), twips::toPixelsY(top));
+    if (readBool(store, kWinpos, QStringLiteral("max"), false))
+        setWindowState(windowState() | Qt::WindowMaximized);
+
+    vbalListViewCtl1->setBackColor(readColour(store, kSettings, QStringLiteral("BackColor"), kOleWhite));
+    mnuBackImgEnabled->setChecked(readBool(store, kSettings, QStringLiteral("BackImgEnabled"), true));
+    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked()
+                                     ? store.GetSetting(kSettings, QStringLiteral("BackImg"))
+                                     : QString());
+    vbalListViewCtl1->setForeColor(readColour(store, kSettings, QStringLiteral("TextColor"), 0));
+
+    const QString romPath = store.GetSetting(kSettings, QStringLiteral("ROMPath"));
+    m_sZ26Path = store.GetSetting(kSettings, QStringLiteral("Z26Path"));
+
+    if (!m_sZ26Path.isEmpty() && !romPath.isEmpty()) {
+        const int listWidth = vbalListViewCtl1->width();
+        m_listModel->addColumn({QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
+        m_listModel->addColumn({QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
+        QHeaderView* header = vbalListViewCtl1->header();
+        header->resizeSection(0, listWidth + twips::toPixelsX(1000));
+        header->resizeSection(1, twips::toPixelsX(1000));
+
+        show();
+        QCoreApplication::processEvents();
+        m_bInitialLoad = true;
+        RefreshMainList();
+        m_bInitialLoad = false;
+        return;
+    }
+
+    if (m_sZ26Path.isEmpty())
+        m_platform.dialogs.MsgBox(this,
+                                  QStringLiteral("You need to select you z26 path before you continue."),
+                                  MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose z26 Path"));
+    else
+        m_platform.dialogs.MsgBox(
+            this, QStringLiteral("You need to select you ROM's path before you continue."),
+            MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose ROM's Path"));
+    m_settings->SelectTab(QStringLiteral("DefaultPaths"));
+    m_settings->show();
+}
+
+void frmMain::RefreshMainList() {
+    SettingsStore& store = m_platform.store;
+    File1.setPattern(m_settings->txtDefPathFilter->text());
+    const QString search = txtSearch->text().trimmed();
+
+    // Counting pass. Each enabled folder is listed once; the scanning pass below reuses
+    // the listing, so both passes see the same files.
+    struct Listing {
+        QString folder;
+        QStringList names;
+    };
+    std::vector<Listing> listings;
+    double total = 0;
+    for (int n = 1;; ++n) {
+        const QString path = store.GetSetting(kSettings, folderKey(n, "Path"));
+        if (path.isEmpty())
+            break;
+        if (!readBool(store, kSettings, folderKey(n, "Checked"), false))
+            continue;
+        File1.setPath(path);
+        total += File1.ListCount();
+        listings.push_back({path, File1.names()});
+    }
+
+    if (m_bInitialLoad) {
+        fraSearch->setTitle(QStringLiteral("Loading ROM's List..."));
+        show();
+    } else {
+        fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
+    }
+    QCoreApplication::processEvents();
+
+    txtSearch->hide();
+    vbalProgressBar1->setMinimum(0);
+    if (total > 0)
+        vbalProgressBar1->setMaximum(static_cast<int>(std::nearbyint(total)));
+    vbalProgressBar1->setValue(0);
+    vbalProgressBar1->show();
+
+    m_listModel->clear();
+
+    // Scanning pass: the rows are gathered first and handed to the list in one batch.
+    QStringList folders;
+    std::vector<RomListModel::Row> rows;
+    int done = 0;
+    int shownPercent = -1;
+    const auto advance = [&](int value) {
+        const int range = vbalProgressBar1->maximum() - vbalProgressBar1->minimum();
+        const int percent = range > 0 ? static_cast<int>(100.0 * value / range) : 0;
+        // The bar is only touched when its shown percentage changes.
+        if (percent != shownPercent) {
+            shownPercent = percent;
+            vbalProgressBar1->setValue(value);
+        }
+    };
+    for (Listing& listing : listings) {
+        const int folderIndex = static_cast<int>(folders.size());
+        folders.push_back(listing.folder);
+        const int count = static_cast<int>(listing.names.size());
+        for (int i = 0; i < count; ++i) {
+            advance(i + done);
+            QString& name = listing.names[i];
+            if (search.isEmpty() || MatchesSearch(search, name))
+                rows.push_back({std::move(name), folderIndex});
+        }
+        done += count;
+        advance(done);
+    }
+    vbalProgressBar1->setValue(done);
+    m_listModel->setRows(std::move(folders), std::move(rows));
+
+    const int k = m_listModel->rowCount();
+    QString mark = k == 1 ? QString() : QStringLiteral("'s");
+    if (m_bInitialLoad) {
+        setWindowTitle(QStringLiteral("lum - %1 ROM%2 Found").arg(k).arg(mark));
+    } else {
+        if (!mark.isEmpty())
+            mark = QStringLiteral("es");
+        setWindowTitle(QStringLiteral("lum - %1 Match%2 out of %3")
+                           .arg(k)
+                           .arg(mark)
+                           .arg(static_cast<qint64>(total)));
+    }
+
+    fraSearch->setTitle(QStringLiteral("Only show filenames containing..."));
+    vbalProgressBar1->hide();
+    txtSearch->show();
+    txtSearch->setFocus();
+}
+
+void frmMain::resizeEvent(QResizeEvent* event) {
+    QMainWindow::resizeEvent(event);
+    Form_Resize();
+}
+
+void frmMain::Form_Resize() {
+    if (isMinimized())
+        return;
+    const int minWidth = twips::toPixelsX(2700);
+    const int minHeight = twips::toPixelsY(2700);
+    if (height() < minHeight || width() < minWidth) {
+        resize(std::max(width(), minWidth), std::max(height(), minHeight));
+        return; // the resize comes back here with the corrected size
+    }
+    const double w = twips::fromPixelsX(width());
+    const double h = twips::fromPixelsY(height());
+    const double frameWidth = w - 330;
+    const double frameHeight = h - 1755;
+    fraSelectRom->setGeometry(twips::toPixelsX(120), twips::toPixelsY(120),
+                              twips::toPixelsX(frameWidth), twips::toPixelsY(frameHeight));
+    vbalListViewCtl1->setGeometry(twips::toPixelsX(120), twips::toPixelsY(240),
+                                  twips::toPixelsX(frameWidth - 240),
+                                  twips::toPixelsY(frameHeight - 345));
+    fraSearch->setGeometry(twips::toPixelsX(120), twips::toPixelsY(frameHeight + 225),
+                           twips::toPixelsX(frameWidth), twips::toPixelsY(675));
+    txtSearch->setGeometry(twips::toPixelsX(120), twips::toPixelsY(270),
+                           twips::toPixelsX(frameWidth - 240), twips::toPixelsY(315));
+    vbalProgressBar1->setGeometry(txtSearch->geometry());
+}
+
+void frmMain::closeEvent(QCloseEvent* event) {
+    Form_Unload();
+    event->accept();
+}
+
+void frmMain::Form_Unload() {
+    SettingsStore& store = m_platform.store;
+    if (!isMinimized()) {
+        if (isMaximized()) {
+            store.SaveSetting(kWinpos, QStringLiteral("max"), boolText(true));
+        } else {
+            store.SaveSetting(kWinpos, QStringLiteral("max"), boolText(false));
+            store.SaveSetting(kWinpos, QStringLiteral("top"), singleText(twips::fromPixelsY(y())));
+            store.SaveSetting(kWinpos, QStringLiteral("left"), singleText(twips::fromPixelsX(x())));
+            store.SaveSetting(kWinpos, QStringLiteral("height"),
+                              singleText(twips::fromPixelsY(height())));
+            store.SaveSetting(kWinpos, QStringLiteral("width"),
+                              singleText(twips::fromPixelsX(width())));
+        }
+    }
+    // Every other window goes with the main one, the settings window saving its state.
+    for (QWidget* window : QApplication::topLevelWidgets()) {
+        if (window != this && window != m_settings.get() && window->isWindow() &&
+            window->isVisible())
+            window->close();
+    }
+    m_settings->Unload();
+}
+
+void frmMain::mnuFileExit_Click() {
+    close();
+}
+
+void frmMain::mnuSettingsConfiguration_Click() {
+    m_settings->show();
+    m_settings->raise();
+    m_settings->activateWindow();
+}
+
+void frmMain::mnuMainRefresh_Click() {
+    RefreshMainList();
+}

@@ -1,0 +1,87 @@
+#pragma once
+
+#include "library/FileLister.h"
+
+#include <QMainWindow>
+
+#include <memory>
+
+struct Platform;
+class frmSettings;
+class ListView;
+class QAction;
+class QGroupBox;
+class QLabel;
+class QLineEdit;
+class QMenu;
+class QProgressBar;
+class RomListModel;
+
+// The main window: the ROM list, the search box and the menus.
+class frmMain : public QMainWindow {
+    Q_OBJECT
+public:
+    explicit frmMain(Platform& platform);
+    ~frmMain() override;
+
+    // The load handler: restores the window and either fills the list or asks for the
+    // missing paths. The start-up routine runs it before showing the window.
+    void Form_Load();
+
+    // Rebuilds the ROM list from the enabled folders, the file pattern and the search box.
+    void RefreshMainList();
+
+    frmSettings& settingsWindow() { return *m_settings; }
+    RomListModel& listModel() { return *m_listModel; }
+
+    // Controls, by the names the rest of the program knows them by.
+    QGroupBox* fraSelectRom = nullptr;
+    ListView* vbalListViewCtl1 = nullptr;
+    QGroupBox* fraSearch = nullptr;
+    QLineEdit* txtSearch = nullptr;
+    QProgressBar* vbalProgressBar1 = nullptr;
+    QLabel* picBack = nullptr;
+    FileLister File1;
+
+    QMenu* mnuFile = nullptr;
+    QAction* mnuFileLoadSettings = nullptr;
+    QAction* mnuFileSaveSettings = nullptr;
+    QAction* mnuFileExit = nullptr;
+    QMenu* mnuSettings = nullptr;
+    QAction* mnuSettingsConfiguration = nullptr;
+    QAction* mnuTextColor = nullptr;
+    QMenu* mnuBackImg = nullptr;
+    QAction* mnuBackImgChange = nullptr;
+    QAction* mnuBackColorChange = nullptr;
+    QAction* mnuBackImgEnabled = nullptr;
+    QMenu* mnuAbout = nullptr;
+    QAction* mnuAboutz26Readme = nullptr;
+    QAction* mnuAboutCopying = nullptr;
+    QAction* mnuAboutz26HomePage = nullptr;
+    QAction* mnuAboutlumAbout = nullptr;
+    QAction* mnuAboutlumHomePage = nullptr;
+    QMenu* mnuMainPopup = nullptr;
+    QAction* mnuMainRefresh = nullptr;
+    QAction* mnuMainGameInfo = nullptr;
+
+    bool m_bInitialLoad = false;
+    QString m_sZ26Path;
+
+protected:
+    void resizeEvent(QResizeEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
+
+private:
+    void createControls();
+    void createMenus();
+    void assignMenuIcons();
+    void Form_Resize();
+    void Form_Unload();
+    void mnuFileExit_Click();
+    void mnuSettingsConfiguration_Click();
+    void mnuMainRefresh_Click();
+
+    Platform& m_platform;
+    std::unique_ptr<frmSettings> m_settings;
+    RomListModel* m_listModel = nullptr;
+};

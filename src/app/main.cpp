@@ -1,0 +1,22 @@
+#include "app/frmMain.h"
+#include "platform/IniSettingsStore.h"
+#include "platform/Platform.h"
+#include "platform/QtDialogs.h"
+#include "platform/QtShell.h"
+
+#include <QApplication>
+
+int main(int argc, char** argv) {
+    QApplication app(argc, argv);
+    QApplication::setApplicationName(QStringLiteral("lum"));
+
+    IniSettingsStore store(IniSettingsStore::defaultFilePath());
+    QtDialogs dialogs;
+    QtShell shell;
+    Platform platform{store, dialogs, shell, QApplication::applicationDirPath()};
+
+    frmMain window(platform);
+    window.Form_Load();
+    window.show();
+    return QApplication::exec();
+}

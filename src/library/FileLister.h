@@ -1,0 +1,48 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+#include <vector>
+
+// A file-name pattern: wildcards ('*', '?') separated by ';', matched against a whole
+// name without regard to case. "*.*" stands for every name, as it always has.
+class FilePattern {
+public:
+    explicit FilePattern(const QString& pattern = QStringLiteral("*.*"));
+    bool matches(QStringView name) const;
+    const QString& text() const { return m_text; }
+    auto wildcardsBegin() const { return m_wildcards.begin(); }
+    auto wildcardsEnd() const { return m_wildcards.end(); }
+
+private:
+    QString m_text;
+    std::vector<QString> m_wildcards; // case-folded
+};
+
+// Lists one folder at a time: the regular, non-hidden files whose names match the
+// pattern, sorted by name without regard to case. A folder that does not exist or cannot
+// be read lists nothing. Setting the folder lists it once; reading the names costs nothing.
+class FileLister {
+public:
+    void setPattern(const QString& pattern);
+    QString pattern() const { return m_pattern.text(); }
+
+    void setPath(const QString& folder);
+    const QString& path() const { return m_path; }
+
+    int ListCount() const { return static_cast<int>(m_names.size()); }
+    // The i-th name, or the empty text past the end.
+    QString List(int index) const;
+    const QStringList& names() const { return m_names; }
+    // Hands the current listing over, leaving the lister empty.
+    QStringList takeNames();
+
+private:
+    FilePattern m_pattern;
+    QString m_path;
+    QStringList m_names;
+};
+
+// Lists `folder` with `pattern` (the lister's work, without a lister).
+QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern);

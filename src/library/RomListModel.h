@@ -1,0 +1,46 @@
+#pragma once
+
+#include <QAbstractTableModel>
+#include <QStringList>
+
+#include <vector>
+
+// The rows of the ROM list: each row is a file name and the folder it was found in.
+// Columns are added by the window (none at first); the first shows the name, the second
+// the folder. Rows are replaced in one batch so a refresh costs one model reset.
+class RomListModel final : public QAbstractTableModel {
+    Q_OBJECT
+public:
+    struct Row {
+        QString name;
+        int folder = 0; // index into folders()
+    };
+    struct Column {
+        QString key;
+        QString header;
+        QString toolTip;
+    };
+
+    using QAbstractTableModel::QAbstractTableModel;
+
+    int rowCount(const QModelIndex& parent = QModelIndex()) const override;
+    int columnCount(const QModelIndex& parent = QModelIndex()) const override;
+    QVariant data(const QModelIndex& index, int role) const override;
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+
+    void addColumn(const Column& column);
+    const std::vector<Column>& columns() const { return m_columns; }
+
+    void clear();
+    void setRows(QStringList folders, std::vector<Row> rows);
+
+    const Row& row(int index) const { return m_rows[static_cast<size_t>(index)]; }
+    const QString& folder(int index) const { return m_folders[index]; }
+    // The full path of a row's file: its own folder, '/', its name.
+    QString rowPath(int index) const;
+
+private:
+    QStringList m_folders;
+    std::vector<Row> m_rows;
+    std::vector<Column> m_columns;
+};

@@ -1,0 +1,78 @@
+#include "library/Search.h"
+
+#include <algorithm>
+
+namespace {
+
+// Characters [start, start + count) of s with 0-based start; counts below zero are
+// zero and a range past the end is cut, as the old string functions did.
+QString mid(const QString& s, qsizetype start, qsizetype count) {
+    if (count <= 0 || start >= s.size())
+        return QString();
+    start = std::max<qsizetype>(start, 0);
+    return s.mid(start, count);
+}
+
+bool contains(const QString& haystack, const QString& term) {
+    if (term.isEmpty())
+        return !haystack.isEmpty();
+    return haystack.contains(term, Qt::CaseInsensitive);
+}
+
+struct Term {
+    QString text;
+    bool negated = false;
+};
+
+Term readTerm(QString t) {
+    t = t.trimmed();
+    const qsizetype q = t.indexOf(QLatin1String("NOT")); // 0-based; 1-based is q + 1
+    if (q < 0)
+        return {t, false};
+    // length(T) - q1 - 2 characters from 1-based q1 + 3, i.e. everything after NOT.
+    const qsizetype q1 = q + 1;
+    return {mid(t, q1 + 2, t.size() - q1 - 2).trimmed(), true};
+}
+
+} // namespace
+
+bool MatchesSearch(const QString& searchText, const QString& fileName) {
+    const QString& s = searchText;
+    const qsizetype length = s.size();
+    enum class Op { And, Xor, Or } op;
+    QString left, right;
+
+    // Positions below are 1-based, as the expression's rules state them.
+    if (const qsizetype i = s.indexOf(QLatin1String("AND")); i >= 0) {
+        const qsizetype p = i + 1;
+        op = Op::And;
+        left = mid(s, 0, p - 2);
+        right = mid(s, p + 2, length - p - 2);
+    } else if (const qsizetype j = s.indexOf(QLatin1String("XOR")); j >= 0) {
+        const qsizetype p = j + 1;
+        op = Op::Xor;
+        left = mid(s, 0, p - 2);
+        right = mid(s, p + 2, length - p - 2);
+    } else if (const qsizetype k = s.indexOf(QLatin1String("OR")); k >= 0) {
+        const qsizetype p = k + 1;
+        op = Op::Or;
+        left = mid(s, 0, p - 1);
+        right = mid(s, p + 1, length - p - 1);
+    } else {
+        return contains(fileName, s);
+    }
+
+    const Term a = readTerm(left);
+    const Term b = readTerm(right);
+    const bool inA = contains(fileName, a.text) != a.negated;
+    const bool inB = contains(fileName, b.text) != b.negated;
+    switch (op) {
+    case Op::And:
+        return inA && inB;
+    case Op::Xor:
+        return inA != inB;
+    case Op::Or:
+        return inA || inB;
+    }
+    return false;
+}

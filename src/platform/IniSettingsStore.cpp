@@ -1,0 +1,180 @@
+#include "platform/IniSettingsStore.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QSaveFile>
+#include <QStandardPaths>
+
+#include <algorithm>
+
+namespace {
+
+bool sameName(const QString& a, const QString& b) {
+    return a.compare(b, Qt::CaseInsensitive) == 0;
+}
+
+// Values may hold any text; line breaks and backslashes are escaped so that one line
+// always holds one key.
+QString escape(const QString& value) {
+    QString out;
+    out.reserve(value.size());
+    for (const QChar c : value) {
+        if (c == u'\\')
+            out += QLatin1String("\\\\");
+        else if (c == u'\n')
+            out += QLatin1String("\\n");
+        else if (c == u'\r')
+            out += QLatin1String("\\r");
+        else
+            out += c;
+    }
+    return out;
+}
+
+QString unescape(const QString& value) {
+    QString out;
+    out.reserve(value.size());
+    for (qsizetype i = 0; i < value.size(); ++i) {
+        const QChar c = value[i];
+        if (c != u'\\' || i + 1 == value.size()) {
+            out += c;
+            continue;
+        }
+        const QChar next = value[++i];
+        if (next == u'n')
+            out += u'\n';
+        else if (next == u'r')
+            out += u'\r';
+        else
+            out += next;
+    }
+    return out;
+}
+
+} // namespace
+
+IniSettingsStore::IniSettingsStore(QString filePath) : m_filePath(std::move(filePath)) {
+    QFile file(m_filePath);
+    // A missing or unreadable file is an empty store; a file bigger than any store we
+    // would write is not read at all.
+    constexpr qint64 maxSize = 16 * 1024 * 1024;
+    if (file.open(QIODevice::ReadOnly) && file.size() <= maxSize)
+        m_sections = parse(file.readAll());
+}
+
+QString IniSettingsStore::defaultFilePath() {
+    return QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) +
+           QStringLiteral("/lum/lum.ini");
+}
+
+std::vector<IniSettingsStore::Section> IniSettingsStore::parse(const QByteArray& text) {
+    std::vector<Section> sections;
+    Section* current = nullptr;
+    const QString all = QString::fromUtf8(text);
+    for (QStringView line : QStringView(all).split(u'\n')) {
+        if (line.endsWith(u'\r'))
+            line.chop(1);
+        const QStringView trimmed = line.trimmed();
+        if (trimmed.isEmpty() || trimmed.startsWith(u';') || trimmed.startsWith(u'#'))
+            continue;
+        if (trimmed.startsWith(u'[') && trimmed.endsWith(u']')) {
+            const QString name = trimmed.mid(1, trimmed.size() - 2).trimmed().toString();
+            auto it = std::find_if(sections.begin(), sections.end(),
+                                   [&](const Section& s) { return sameName(s.name, name); });
+            if (it == sections.end()) {
+                sections.push_back({name, {}});
+                current = &sections.back();
+            } else {
+                current = &*it;
+            }
+            continue;
+        }
+        const qsizetype eq = line.indexOf(u'=');
+        if (current == nullptr || eq <= 0)
+            continue;
+        const QString key = line.left(eq).trimmed().toString();
+        if (key.isEmpty())
+            continue;
+        const QString value = unescape(line.mid(eq + 1).toString());
+        auto it = std::find_if(current->entries.begin(), current->entries.end(),
+                               [&](const Entry& e) { return sameName(e.key, key); });
+        if (it == current->entries.end())
+            current->entries.push_back({key, value});
+        else
+            it->value = value; // the last of two spellings wins, as on a rewrite
+    }
+    return sections;
+}
+
+QByteArray IniSettingsStore::format(const std::vector<Section>& sections) {
+    QString out;
+    for (const Section& section : sections) {
+        if (section.entries.empty())
+            continue;
+        if (!out.isEmpty())
+            out += u'\n';
+        out += u'[' + section.name + QLatin1String("]\n");
+        for (const Entry& entry : section.entries)
+            out += entry.key + u'=' + escape(entry.value) + u'\n';
+    }
+    return out.toUtf8();
+}
+
+IniSettingsStore::Section* IniSettingsStore::findSection(const QString& name) {
+    auto it = std::find_if(m_sections.begin(), m_sections.end(),
+                           [&](const Section& s) { return sameName(s.name, name); });
+    return it == m_sections.end() ? nullptr : &*it;
+}
+
+const IniSettingsStore::Section* IniSettingsStore::findSection(const QString& name) const {
+    return const_cast<IniSettingsStore*>(this)->findSection(name);
+}
+
+QString IniSettingsStore::GetSetting(const QString& section, const QString& key,
+                                     const QString& def) const {
+    const Section* s = findSection(section);
+    if (s == nullptr)
+        return def;
+    for (const Entry& e : s->entries)
+        if (sameName(e.key, key))
+            return e.value;
+    return def;
+}
+
+bool IniSettingsStore::SaveSetting(const QString& section, const QString& key,
+                                   const QString& value) {
+    Section* s = findSection(section);
+    if (s == nullptr) {
+        m_sections.push_back({section, {}});
+        s = &m_sections.back();
+    }
+    auto it = std::find_if(s->entries.begin(), s->entries.end(),
+                           [&](const Entry& e) { return sameName(e.key, key); });
+    if (it == s->entries.end()) {
+        s->entries.push_back({key, value});
+    } else {
+        if (it->value == value)
+            return true;
+        it->value = value;
+    }
+    return write();
+}
+
+bool IniSettingsStore::DeleteSetting(const QString& section, const QString& key) {
+    Section* s = findSection(section);
+    if (s == nullptr)
+        return true;
+    const auto before = s->entries.size();
+    std::erase_if(s->entries, [&](const Entry& e) { return sameName(e.key, key); });
+    return before == s->entries.size() ? true : write();
+}
+
+bool IniSettingsStore::write() const {
+    QDir().mkpath(QFileInfo(m_filePath).absolutePath());
+    QSaveFile file(m_filePath);
+    if (!file.open(QIODevice::WriteOnly))
+        return false;
+    file.write(format(m_sections));
+    return file.commit();
+}

@@ -1,0 +1,83 @@
+#include "ui/ListView.h"
+
+#include "ui/OleColor.h"
+
+#include <QHeaderView>
+#include <QImageReader>
+#include <QKeyEvent>
+#include <QMouseEvent>
+
+ListView::ListView(QWidget* parent) : QTreeView(parent) {
+    setRootIsDecorated(false);
+    setItemsExpandable(false);
+    setUniformRowHeights(true); // keeps 100,000 rows cheap to lay out
+    setSelectionBehavior(QAbstractItemView::SelectRows);
+    setSelectionMode(QAbstractItemView::SingleSelection);
+    setEditTriggers(QAbstractItemView::NoEditTriggers);
+    setAllColumnsShowFocus(true);
+    header()->setStretchLastSection(false);
+    connect(this, &QAbstractItemView::doubleClicked, this,
+            [this](const QModelIndex& index) { emit itemDoubleClicked(index.row()); });
+    applyPalette();
+}
+
+void ListView::setBackColor(quint32 ole) {
+    m_backColor = ole;
+    applyPalette();
+}
+
+void ListView::setForeColor(quint32 ole) {
+    m_foreColor = ole;
+    applyPalette();
+}
+
+void ListView::setPicture(const QString& file) {
+    m_pictureFile = file;
+    m_picture = QPixmap();
+    if (!file.isEmpty()) {
+        QImageReader reader(file);
+        // A background is a picture of modest size; a huge or broken file shows none.
+        const QSize size = reader.size();
+        if (size.isValid() && size.width() <= 8192 && size.height() <= 8192)
+            m_picture = QPixmap::fromImageReader(&reader);
+    }
+    applyPalette();
+}
+
+void ListView::applyPalette() {
+    QPalette p = palette();
+    const QColor back = oleToColor(m_backColor);
+    const QColor text = oleToColor(m_foreColor);
+    if (m_picture.isNull()) {
+        p.setBrush(QPalette::Base, back);
+    } else {
+        QBrush brush(back);
+        brush.setTexture(m_picture);
+        p.setBrush(QPalette::Base, brush);
+    }
+    p.setColor(QPalette::AlternateBase, back);
+    p.setColor(QPalette::Text, text);
+    p.setColor(QPalette::WindowText, text);
+    setPalette(p);
+    viewport()->update();
+}
+
+int ListView::selectedRow() const {
+    const QModelIndex index = currentIndex();
+    if (!index.isValid() || !selectionModel()->isRowSelected(index.row(), QModelIndex()))
+        return -1;
+    return index.row();
+}
+
+void ListView::keyPressEvent(QKeyEvent* event) {
+    emit keyDown(event->key());
+    if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter ||
+        event->key() == Qt::Key_F5)
+        return;
+    QTreeView::keyPressEvent(event);
+}
+
+void ListView::mousePressEvent(QMouseEvent* event) {
+    QTreeView::mousePressEvent(event);
+    emit mouseDown(event->button(), event->globalPosition().toPoint());
+}
