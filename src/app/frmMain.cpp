@@ -157,7 +157,8 @@ void frmMain::Form_Load() {
     }
 
     SettingsStore& store = m_platform.store;
-    File1.setPattern(store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.*")));
+    File1.setPattern(
+        store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.*")));
 
     const double height = readSingle(store, kWinpos, QStringLiteral("height"), 6570);
     const double width = readSingle(store, kWinpos, QStringLiteral("width"), 4905);
@@ -168,8 +169,10 @@ void frmMain::Form_Load() {
     if (readBool(store, kWinpos, QStringLiteral("max"), false))
         setWindowState(windowState() | Qt::WindowMaximized);
 
-    vbalListViewCtl1->setBackColor(readColour(store, kSettings, QStringLiteral("BackColor"), kOleWhite));
-    mnuBackImgEnabled->setChecked(readBool(store, kSettings, QStringLiteral("BackImgEnabled"), true));
+    vbalListViewCtl1->setBackColor(
+        readColour(store, kSettings, QStringLiteral("BackColor"), kOleWhite));
+    mnuBackImgEnabled->setChecked(
+        readBool(store, kSettings, QStringLiteral("BackImgEnabled"), true));
     vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked()
                                      ? store.GetSetting(kSettings, QStringLiteral("BackImg"))
                                      : QString());
@@ -180,8 +183,10 @@ void frmMain::Form_Load() {
 
     if (!m_sZ26Path.isEmpty() && !romPath.isEmpty()) {
         const int listWidth = vbalListViewCtl1->width();
-        m_listModel->addColumn({QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
-        m_listModel->addColumn({QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
+        m_listModel->addColumn(
+            {QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
+        m_listModel->addColumn(
+            {QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
         QHeaderView* header = vbalListViewCtl1->header();
         header->resizeSection(0, listWidth + twips::toPixelsX(1000));
         header->resizeSection(1, twips::toPixelsX(1000));
@@ -195,9 +200,9 @@ void frmMain::Form_Load() {
     }
 
     if (m_sZ26Path.isEmpty())
-        m_platform.dialogs.MsgBox(this,
-                                  QStringLiteral("You need to select you z26 path before you continue."),
-                                  MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose z26 Path"));
+        m_platform.dialogs.MsgBox(
+            this, QStringLiteral("You need to select you z26 path before you continue."),
+            MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose z26 Path"));
     else
         m_platform.dialogs.MsgBox(
             this, QStringLiteral("You need to select you ROM's path before you continue."),

@@ -34,8 +34,8 @@ class Dialogs {
 public:
     virtual ~Dialogs() = default;
 
-    virtual MsgResult MsgBox(QWidget* owner, const QString& text, MsgButtons buttons,
-                             MsgIcon icon, const QString& title = QStringLiteral("lum")) = 0;
+    virtual MsgResult MsgBox(QWidget* owner, const QString& text, MsgButtons buttons, MsgIcon icon,
+                             const QString& title = QStringLiteral("lum")) = 0;
     // The chosen full path, or the empty text when the user cancelled.
     virtual QString ShowOpen(QWidget* owner, const FileDialogRequest& request) = 0;
     virtual QString ShowSave(QWidget* owner, const FileDialogRequest& request) = 0;

@@ -15,8 +15,8 @@ bool FileExist(const QString& path) {
     if (!folder.exists())
         return false;
     return !folder
-                .entryList({name}, QDir::AllEntries | QDir::Hidden | QDir::System |
-                                       QDir::NoDotAndDotDot)
+                .entryList({name},
+                           QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot)
                 .isEmpty();
 }
 

@@ -59,8 +59,8 @@ QString runFileDialog(QWidget* owner, const FileDialogRequest& request,
 
 } // namespace
 
-MsgResult QtDialogs::MsgBox(QWidget* owner, const QString& text, MsgButtons buttons,
-                            MsgIcon icon, const QString& title) {
+MsgResult QtDialogs::MsgBox(QWidget* owner, const QString& text, MsgButtons buttons, MsgIcon icon,
+                            const QString& title) {
     QMessageBox box(qtIcon(icon), title, text, qtButtons(buttons), owner);
     switch (box.exec()) {
     case QMessageBox::Ok:
@@ -71,7 +71,7 @@ MsgResult QtDialogs::MsgBox(QWidget* owner, const QString& text, MsgButtons butt
         return MsgResult::No;
     default:
         // Closing a box without a Cancel button counts as its only answer.
-        return buttons == MsgButtons::Ok     ? MsgResult::Ok
+        return buttons == MsgButtons::Ok      ? MsgResult::Ok
                : buttons == MsgButtons::YesNo ? MsgResult::No
                                               : MsgResult::Cancel;
     }

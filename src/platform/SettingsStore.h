@@ -27,8 +27,7 @@ bool parseBool(const QString& text, bool def);
 
 double readSingle(const SettingsStore& store, const QString& section, const QString& key,
                   double def);
-qint64 readLong(const SettingsStore& store, const QString& section, const QString& key,
-                qint64 def);
+qint64 readLong(const SettingsStore& store, const QString& section, const QString& key, qint64 def);
 bool readBool(const SettingsStore& store, const QString& section, const QString& key, bool def);
 // An OLE colour (0x00BBGGRR, or a system colour with the top bit set) as stored in decimal.
 quint32 readColour(const SettingsStore& store, const QString& section, const QString& key,

@@ -8,16 +8,16 @@ namespace {
 // System colour indices as Windows numbers them, mapped to the nearest palette role.
 QPalette::ColorRole systemRole(quint32 index) {
     switch (index) {
-    case 1:  // desktop
-    case 4:  // menu
-    case 5:  // window
+    case 1: // desktop
+    case 4: // menu
+    case 5: // window
         return QPalette::Base;
     case 6:  // window frame
     case 10: // active border
     case 11: // inactive border
         return QPalette::Mid;
-    case 7:  // menu text
-    case 8:  // window text
+    case 7: // menu text
+    case 8: // window text
         return QPalette::Text;
     case 13: // highlight
         return QPalette::Highlight;

@@ -72,7 +72,8 @@ TEST(SettingsStore, AnUnwritableFolderReportsTheFailureAndKeepsTheValueInMemory)
 
 TEST(SettingsStore, GarbageFilesReadAsAnEmptyStoreWithoutCrashing) {
     FakePlatform fake;
-    const QString path = fake.writeFile("garbage.ini", QByteArray("\xff\xfe=\n[\n=x\n[a]\n=\nk\n", 17));
+    const QString path =
+        fake.writeFile("garbage.ini", QByteArray("\xff\xfe=\n[\n=x\n[a]\n=\nk\n", 17));
     IniSettingsStore store(path);
     EXPECT_EQ(store.GetSetting("a", "k", "d"), "d");
     EXPECT_TRUE(store.SaveSetting("a", "k", "v"));

@@ -8,7 +8,8 @@
 // configuration folders pointed at a throw-away place so nothing touches the user's own.
 int main(int argc, char** argv) {
     qputenv("QT_QPA_PLATFORM", "offscreen");
-    static QByteArray home = QByteArray("/tmp/lum-test-home-") + QByteArray::number(qint64(getpid()));
+    static QByteArray home =
+        QByteArray("/tmp/lum-test-home-") + QByteArray::number(qint64(getpid()));
     qputenv("XDG_CONFIG_HOME", home + "/config");
     qputenv("XDG_DATA_HOME", home + "/data");
     QApplication app(argc, argv);
