@@ -1,8 +1,10 @@
 #include "app/frmMain.h"
+#include "platform/Downloader.h"
 #include "platform/IniSettingsStore.h"
 #include "platform/Platform.h"
 #include "platform/QtDialogs.h"
 #include "platform/QtShell.h"
+#include "platform/Registry.h"
 
 #include <QApplication>
 
@@ -13,7 +15,10 @@ int main(int argc, char** argv) {
     IniSettingsStore store(IniSettingsStore::defaultFilePath());
     QtDialogs dialogs;
     QtShell shell;
-    Platform platform{store, dialogs, shell, QApplication::applicationDirPath()};
+    QtDownloader network;
+    ToolRegistry registry;
+    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network,
+                      registry};
 
     frmMain window(platform);
     window.Form_Load();

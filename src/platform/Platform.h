@@ -3,6 +3,8 @@
 #include <QString>
 
 class Dialogs;
+class Downloader;
+class Registry;
 class SettingsStore;
 class Shell;
 
@@ -14,4 +16,6 @@ struct Platform {
     Shell& shell;
     // The folder that holds the executable and its data files (no trailing separator).
     QString programFolder;
+    Downloader& network;
+    Registry& registry;
 };

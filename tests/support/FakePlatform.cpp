@@ -82,9 +82,24 @@ bool FakeShell::OpenFolder(const QString& path) {
     return succeed;
 }
 
+std::optional<RegistryValue> FakeRegistry::QueryValue(quint32 root, const QString& keyName,
+                                                      const QString& valueName) {
+    lookups.push_back({root, keyName, valueName});
+    for (const auto& [where, value] : values)
+        if (where.root == root && where.keyName == keyName && where.valueName == valueName)
+            return value;
+    return std::nullopt;
+}
+
+void FakeRegistry::set(quint32 root, const QString& keyName, const QString& valueName,
+                       RegistryValue value) {
+    values.push_back({{root, keyName, valueName}, std::move(value)});
+}
+
 FakePlatform::FakePlatform()
     : store(m_dir.path() + QStringLiteral("/config/lum/lum.ini")),
-      platform{store, dialogs, shell, m_dir.path() + QStringLiteral("/program")} {
+      platform{store, dialogs, shell, m_dir.path() + QStringLiteral("/program"), network,
+               registry} {
     QDir().mkpath(programFolder());
 }
 

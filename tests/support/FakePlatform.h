@@ -1,8 +1,10 @@
 #pragma once
 
 #include "platform/Dialogs.h"
+#include "platform/Downloader.h"
 #include "platform/IniSettingsStore.h"
 #include "platform/Platform.h"
+#include "platform/Registry.h"
 #include "platform/Shell.h"
 
 #include <QStringList>
@@ -69,6 +71,23 @@ public:
     QStringList folders;
 };
 
+// A registry that answers from a script and records every lookup.
+class FakeRegistry final : public Registry {
+public:
+    struct Lookup {
+        quint32 root;
+        QString keyName;
+        QString valueName;
+    };
+    std::optional<RegistryValue> QueryValue(quint32 root, const QString& keyName,
+                                            const QString& valueName) override;
+    void set(quint32 root, const QString& keyName, const QString& valueName,
+             RegistryValue value);
+
+    std::vector<std::pair<Lookup, RegistryValue>> values;
+    std::vector<Lookup> lookups;
+};
+
 // A whole fake platform over a temporary folder: the store is a real INI file in it and
 // the program folder is a subfolder of it.
 class FakePlatform {
@@ -89,5 +108,8 @@ public:
     IniSettingsStore store;
     FakeDialogs dialogs;
     FakeShell shell;
+    // Downloads are real; tests serve them from 127.0.0.1.
+    QtDownloader network{std::chrono::seconds(5)};
+    FakeRegistry registry;
     Platform platform;
 };

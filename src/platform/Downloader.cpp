@@ -1,0 +1,60 @@
+#include "platform/Downloader.h"
+
+#include <QEventLoop>
+#include <QNetworkAccessManager>
+#include <QNetworkReply>
+#include <QNetworkRequest>
+#include <QSaveFile>
+#include <QUrl>
+
+QtDownloader::QtDownloader(std::chrono::milliseconds stallTimeout) : m_stallTimeout(stallTimeout) {}
+
+QtDownloader::~QtDownloader() = default;
+
+bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename) {
+    const QUrl url(URL, QUrl::StrictMode);
+    const QString scheme = url.scheme().toLower();
+    // Only the web: a description file must not be able to copy local files around.
+    if (!url.isValid() || (scheme != u"http" && scheme != u"https") || url.host().isEmpty())
+        return false;
+
+    QSaveFile target(LocalFilename);
+    if (!target.open(QIODevice::WriteOnly))
+        return false;
+
+    if (!m_manager)
+        m_manager = std::make_unique<QNetworkAccessManager>();
+
+    QNetworkRequest request(url);
+    request.setAttribute(QNetworkRequest::RedirectPolicyAttribute,
+                         QNetworkRequest::NoLessSafeRedirectPolicy);
+    request.setTransferTimeout(int(m_stallTimeout.count()));
+
+    QNetworkReply* reply = m_manager->get(request);
+    bool writeFailed = false;
+    QEventLoop loop;
+    QObject::connect(reply, &QNetworkReply::readyRead, &loop, [&] {
+        const QByteArray chunk = reply->readAll();
+        if (!writeFailed && target.write(chunk) != chunk.size()) {
+            writeFailed = true;
+            reply->abort();
+        }
+    });
+    QObject::connect(reply, &QNetworkReply::finished, &loop, &QEventLoop::quit);
+    if (!reply->isFinished())
+        loop.exec(QEventLoop::ExcludeUserInputEvents);
+
+    const QByteArray rest = reply->readAll();
+    if (!writeFailed && target.write(rest) != rest.size())
+        writeFailed = true;
+
+    const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
+    const bool ok =
+        !writeFailed && reply->error() == QNetworkReply::NoError && status >= 200 && status < 300;
+    reply->deleteLater();
+    if (!ok) {
+        target.cancelWriting();
+        return false;
+    }
+    return target.commit();
+}
