@@ -11,11 +11,13 @@
 #include "ui/ListView.h"
 #include "ui/OleColor.h"
 #include "ui/Twips.h"
+#include "ui/cTextBoxXP.h"
 
 #include <QApplication>
 #include <QCloseEvent>
 #include <QGroupBox>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
@@ -66,6 +68,10 @@ void frmMain::createControls() {
     vbalProgressBar1->setTextVisible(true);
     vbalProgressBar1->setAlignment(Qt::AlignCenter);
     vbalProgressBar1->hide();
+
+    txtSearch->installEventFilter(this);
+    connect(vbalListViewCtl1, &ListView::keyDown, this, &frmMain::vbalListViewCtl1_KeyDown);
+    connect(vbalListViewCtl1, &ListView::mouseDown, this, &frmMain::vbalListViewCtl1_MouseDown);
 
     picBack = new QLabel(central);
     picBack->setObjectName(QStringLiteral("picBack"));
@@ -372,4 +378,66 @@ void frmMain::mnuSettingsConfiguration_Click() {
 
 void frmMain::mnuMainRefresh_Click() {
     RefreshMainList();
+}
+
+bool frmMain::eventFilter(QObject* watched, QEvent* event) {
+    if (watched == txtSearch) {
+        if (event->type() == QEvent::KeyPress) {
+            const auto* key = static_cast<QKeyEvent*>(event);
+            if (txtSearch_KeyPress(key->key(), key->modifiers()))
+                return true;
+        } else if (event->type() == QEvent::MouseButtonDblClick) {
+            txtSearch_DblClick();
+            return true;
+        }
+    }
+    return QMainWindow::eventFilter(watched, event);
+}
+
+bool frmMain::txtSearch_KeyPress(int key, Qt::KeyboardModifiers modifiers) {
+    if (key == Qt::Key_Return || key == Qt::Key_Enter) {
+        RefreshMainList();
+        return true;
+    }
+    if ((modifiers & Qt::ControlModifier) == 0 ||
+        (modifiers & (Qt::AltModifier | Qt::ShiftModifier)))
+        return false;
+    QString insert;
+    if (key == Qt::Key_A)
+        insert = QStringLiteral(" AND ");
+    else if (key == Qt::Key_O)
+        insert = QStringLiteral(" OR ");
+    else if (key == Qt::Key_N)
+        insert = QStringLiteral(" NOT ");
+    else
+        return false;
+    const int caret = txtSearch->cursorPosition();
+    const QString text = txtSearch->text();
+    txtSearch->setText(text.left(caret) + insert + text.mid(caret));
+    txtSearch->setCursorPosition(caret + static_cast<int>(insert.size()));
+    return true;
+}
+
+void frmMain::txtSearch_DblClick() {
+    cTextBoxXP tip;
+    tip.setTextBox(txtSearch);
+    tip.setBalloonTipIcon(1);
+    tip.setBalloonTipTitle(QStringLiteral("Advanced Search"));
+    tip.setBalloonTipText(
+        QStringLiteral("You can use the following logic operations in your search: AND, OR, XOR, "
+                       "NOT\r\nBut the Operations must be capitalized.\r\nfor example...  pac "
+                       "AND man... asteroids AND NOT [pal]."));
+    tip.ShowBalloonTip();
+}
+
+void frmMain::vbalListViewCtl1_KeyDown(int key) {
+    if (key == Qt::Key_F5)
+        RefreshMainList();
+}
+
+void frmMain::vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos) {
+    if (button != Qt::RightButton)
+        return;
+    mnuMainGameInfo->setVisible(false);
+    mnuMainPopup->popup(globalPos);
 }

@@ -67,7 +67,15 @@ public:
     bool m_bInitialLoad = false;
     QString m_sZ26Path;
 
+    // The search box's handlers: Enter refreshes, Ctrl+A / Ctrl+O / Ctrl+N insert an
+    // operator at the caret; a double-click shows the search help.
+    bool txtSearch_KeyPress(int key, Qt::KeyboardModifiers modifiers);
+    void txtSearch_DblClick();
+    void vbalListViewCtl1_KeyDown(int key);
+    void vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos);
+
 protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
 

@@ -17,8 +17,7 @@ int main(int argc, char** argv) {
     QtShell shell;
     QtDownloader network;
     ToolRegistry registry;
-    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network,
-                      registry};
+    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network, registry};
 
     frmMain window(platform);
     window.Form_Load();

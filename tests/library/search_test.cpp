@@ -1,0 +1,72 @@
+#include "library/Search.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+struct Case {
+    const char* search;
+    const char* name;
+    bool matches;
+};
+
+// Each row is a search text, a file name and whether the name is kept.
+const Case kCases[] = {
+    // A single term is a substring matched without regard to case.
+    {"pac", "Pac-Man (1982).bin", true},
+    {"PAC", "pac-man.bin", true},
+    {"kong", "Pac-Man.bin", false},
+    // Operators count only in capitals; otherwise the whole text is one term.
+    {"pac AND man", "Pac-Man.bin", true},
+    {"pac AND man", "Pacific.bin", false},
+    {"pac and man", "Pac-Man.bin", false},
+    {"pac and man", "pac and man.bin", true},
+    {"PAC AND MAN", "Pac-Man.bin", true},
+    // XOR keeps names with exactly one of the terms.
+    {"pac XOR man", "Pac-Man.bin", false},
+    {"pac XOR man", "Pacific.bin", true},
+    {"pac XOR man", "Batman.bin", true},
+    {"pac XOR man", "Pitfall.bin", false},
+    {"pit OR kong", "Pitfall.bin", true},
+    {"pit OR kong", "Donkey Kong.bin", true},
+    {"pit OR kong", "Pac-Man.bin", false},
+    // NOT on either side, or both.
+    {"asteroids AND NOT [pal]", "Asteroids.bin", true},
+    {"asteroids AND NOT [pal]", "Asteroids [PAL].bin", false},
+    {"NOT pac AND man", "Batman.bin", true},
+    {"NOT pac AND man", "Pac-Man.bin", false},
+    {"NOT a OR NOT b", "ab.bin", false},
+    {"NOT a OR NOT b", "a.rom", true},
+    {"NOT x XOR NOT y", "x.rom", true},
+    {"NOT x XOR NOT y", "xy.rom", false},
+    // Whatever stands before NOT in a term is dropped; only the first NOT counts.
+    {"junk NOT pal AND x", "x.bin", true},
+    {"pal NOT", "pal NOT.bin", true}, // no operator: NOT is plain text
+    // The character before AND/XOR goes with the operator, even when it is no blank.
+    {"pacAND man", "pa man.bin", true},
+    {"pacAND man", "Pac-Man.bin", true},
+    {"pacXOR xyz", "pa.bin", true},
+    // AND is found first, so "a OR b AND c" splits at AND with a literal left term.
+    {"a OR b AND c", "a OR b c.bin", true},
+    {"a OR b AND c", "a.c", false},
+    // AND inside a word in capitals is an operator: A is empty (in every name).
+    {"ANDROMEDA", "romeda.bin", true},
+    {"ANDROMEDA", "Andromeda.bin", true},
+    {"ANDROMEDA", "Pitfall.bin", false},
+    // An empty right term is in every name.
+    {"x AND", "x.bin", true},
+    {"x AND", "y.bin", false},
+    {"AND", "y.bin", true},
+    {"OR", "y.bin", true},
+    // Capital words that merely contain the letters are still operators.
+    {"CORE", "c.bin", true}, // "C" OR "E"
+    {"CORE", "x.bin", false},
+};
+
+} // namespace
+
+TEST(MatchesSearch, ExpressionTable) {
+    for (const Case& c : kCases)
+        EXPECT_EQ(MatchesSearch(QString::fromUtf8(c.search), QString::fromUtf8(c.name)), c.matches)
+            << '"' << c.search << "\" on \"" << c.name << '"';
+}
