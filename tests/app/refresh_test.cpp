@@ -1,0 +1,164 @@
+#include "AppFixture.h"
+
+#include "library/RomListModel.h"
+#include "settings/frmSettings.h"
+#include "ui/ListView.h"
+#include "ui/cTextBoxXP.h"
+
+#include <QGroupBox>
+#include <QLineEdit>
+#include <QProgressBar>
+#include <QTest>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+// A main window whose first refresh already ran over the given folders.
+class RefreshTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        app.fake.store.SaveSetting("Settings", "Z26Path", app.fake.root());
+        app.fake.store.SaveSetting("Settings", "ROMFilter", "*.bin");
+    }
+    QStringList names() {
+        QStringList out;
+        for (int i = 0; i < app.window->listModel().rowCount(); ++i)
+            out << app.window->listModel().row(i).name;
+        return out;
+    }
+    void search(const QString& text) {
+        app.window->txtSearch->setText(text);
+        QTest::keyClick(app.window->txtSearch, Qt::Key_Return);
+    }
+    AppFixture app;
+};
+
+} // namespace
+
+TEST_F(RefreshTest, CaptionsCountRowsInBothModes) {
+    app.storeFolder(1, app.romFolder("roms", {"Pac-Man.bin", "Pitfall.bin", "Combat.bin"}));
+    frmMain& w = app.load();
+    EXPECT_EQ(w.windowTitle(), "lum - 3 ROM's Found");
+    search("pit");
+    EXPECT_EQ(w.windowTitle(), "lum - 1 Match out of 3");
+    search("kong");
+    EXPECT_EQ(w.windowTitle(), "lum - 0 Matches out of 3");
+    search("  ");
+    EXPECT_EQ(w.windowTitle(), "lum - 3 Matches out of 3");
+    EXPECT_EQ(w.fraSearch->title(), "Only show filenames containing...");
+    EXPECT_TRUE(w.txtSearch->isVisible());
+    EXPECT_FALSE(w.vbalProgressBar1->isVisible());
+    EXPECT_TRUE(w.txtSearch->hasFocus() || !w.isActiveWindow());
+}
+
+TEST_F(RefreshTest, OneAndNoRowsAtStartUp) {
+    app.storeFolder(1, app.romFolder("one", {"Solo.bin"}));
+    EXPECT_EQ(app.load().windowTitle(), "lum - 1 ROM Found");
+
+    AppFixture empty;
+    empty.fake.store.SaveSetting("Settings", "Z26Path", empty.fake.root());
+    empty.storeFolder(1, empty.romFolder("none", {"readme.txt"}));
+    empty.fake.store.SaveSetting("Settings", "ROMFilter", "*.bin");
+    EXPECT_EQ(empty.load().windowTitle(), "lum - 0 ROM's Found");
+}
+
+TEST_F(RefreshTest, DisabledFolderBetweenEnabledOnesIsNeitherCountedNorListed) {
+    app.storeFolder(1, app.romFolder("first", {"a.bin"}));
+    app.storeFolder(2, app.romFolder("second", {"b.bin", "c.bin"}), false);
+    app.storeFolder(3, app.romFolder("third", {"d.bin"}));
+    frmMain& w = app.load();
+    EXPECT_EQ(names(), (QStringList{"a.bin", "d.bin"}));
+    search("bin");
+    EXPECT_EQ(w.windowTitle(), "lum - 2 Matches out of 2");
+    EXPECT_EQ(w.vbalProgressBar1->value(), 2); // the bar ends at the total
+    EXPECT_EQ(w.vbalProgressBar1->maximum(), 2);
+}
+
+TEST_F(RefreshTest, AnEmptyPathEndsTheFolderList) {
+    app.storeFolder(1, app.romFolder("first", {"a.bin"}));
+    app.storeFolder(2, QString());
+    app.storeFolder(3, app.romFolder("third", {"d.bin"}));
+    app.load();
+    EXPECT_EQ(names(), QStringList{"a.bin"});
+}
+
+TEST_F(RefreshTest, SameNameInTwoFoldersGivesTwoRowsWithTheirOwnFolders) {
+    const QString first = app.romFolder("first", {"Combat.bin"});
+    const QString second = app.romFolder("second", {"Combat.bin", "Adventure.bin"});
+    app.storeFolder(1, first);
+    app.storeFolder(2, second);
+    frmMain& w = app.load();
+    ASSERT_EQ(names(), (QStringList{"Combat.bin", "Adventure.bin", "Combat.bin"}));
+    EXPECT_EQ(w.listModel().rowPath(0), first + "/Combat.bin");
+    EXPECT_EQ(w.listModel().rowPath(2), second + "/Combat.bin");
+    EXPECT_EQ(w.listModel().data(w.listModel().index(2, 1), Qt::DisplayRole).toString(), second);
+}
+
+TEST_F(RefreshTest, AMissingFolderListsNothingAndStopsNothing) {
+    app.storeFolder(1, app.fake.root() + "/gone");
+    app.storeFolder(2, app.romFolder("here", {"x.bin"}));
+    EXPECT_EQ(app.load().windowTitle(), "lum - 1 ROM Found");
+}
+
+TEST_F(RefreshTest, ThePatternComesFromTheSettingsWindow) {
+    app.storeFolder(1, app.romFolder("roms", {"a.bin", "b.a26", "c.txt"}));
+    frmMain& w = app.load();
+    w.settingsWindow().txtDefPathFilter->setText("*.BIN;*.A26");
+    search("");
+    EXPECT_EQ(names(), (QStringList{"a.bin", "b.a26"}));
+}
+
+TEST_F(RefreshTest, SearchExpressionsNarrowTheList) {
+    app.storeFolder(1, app.romFolder("roms", {"Asteroids.bin", "Asteroids [PAL].bin", "Pac-Man.bin",
+                                              "Ms. Pac-Man.bin", "Pacific.bin"}));
+    frmMain& w = app.load();
+    search("asteroids AND NOT [pal]");
+    EXPECT_EQ(names(), QStringList{"Asteroids.bin"});
+    search("pac AND man");
+    EXPECT_EQ(names(), (QStringList{"Ms. Pac-Man.bin", "Pac-Man.bin"}));
+    // F5 in the list applies the expression in the box as well.
+    w.txtSearch->setText("pacific");
+    QTest::keyClick(w.vbalListViewCtl1, Qt::Key_F5);
+    EXPECT_EQ(names(), QStringList{"Pacific.bin"});
+}
+
+TEST_F(RefreshTest, RefreshingAgainKeepsOneRowPerFile) {
+    app.storeFolder(1, app.romFolder("roms", {"a.bin", "b.bin"}));
+    frmMain& w = app.load();
+    for (int i = 0; i < 5; ++i)
+        w.mnuMainRefresh->trigger();
+    EXPECT_EQ(w.listModel().rowCount(), 2);
+}
+
+TEST(SearchBox, ControlKeysInsertOperatorsAtTheCaret) {
+    AppFixture app;
+    frmMain& w = app.load();
+    w.txtSearch->setText("pacman");
+    w.txtSearch->setCursorPosition(3);
+    QTest::keyClick(w.txtSearch, Qt::Key_A, Qt::ControlModifier);
+    EXPECT_EQ(w.txtSearch->text(), "pac AND man");
+    EXPECT_EQ(w.txtSearch->cursorPosition(), 8);
+    QTest::keyClick(w.txtSearch, Qt::Key_N, Qt::ControlModifier);
+    EXPECT_EQ(w.txtSearch->text(), "pac AND  NOT man");
+    EXPECT_EQ(w.txtSearch->cursorPosition(), 13);
+    w.txtSearch->setCursorPosition(0);
+    QTest::keyClick(w.txtSearch, Qt::Key_O, Qt::ControlModifier);
+    EXPECT_EQ(w.txtSearch->text(), " OR pac AND  NOT man");
+    EXPECT_EQ(w.txtSearch->cursorPosition(), 4);
+    EXPECT_TRUE(w.txtSearch->selectedText().isEmpty()); // Ctrl+A selects nothing here
+}
+
+TEST(SearchBox, DoubleClickShowsTheSearchHelp) {
+    AppFixture app;
+    frmMain& w = app.load();
+    QTest::mouseDClick(w.txtSearch, Qt::LeftButton);
+    BalloonTip* tip = cTextBoxXP::shownOn(w.txtSearch);
+    ASSERT_NE(tip, nullptr);
+    EXPECT_EQ(tip->icon(), 1);
+    EXPECT_EQ(tip->title(), "Advanced Search");
+    EXPECT_EQ(tip->text(),
+              "You can use the following logic operations in your search: AND, OR, XOR, NOT\r\n"
+              "But the Operations must be capitalized.\r\n"
+              "for example...  pac AND man... asteroids AND NOT [pal].");
+}
