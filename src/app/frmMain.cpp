@@ -12,6 +12,7 @@
 #include "ui/OleColor.h"
 #include "ui/Twips.h"
 #include "ui/cTextBoxXP.h"
+#include "ui/vbalProgressBar.h"
 
 #include <QApplication>
 #include <QCloseEvent>
@@ -21,7 +22,6 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
-#include <QProgressBar>
 
 #include <cmath>
 
@@ -63,10 +63,9 @@ void frmMain::createControls() {
     fraSearch->setObjectName(QStringLiteral("fraSearch"));
     txtSearch = new QLineEdit(fraSearch);
     txtSearch->setObjectName(QStringLiteral("txtSearch"));
-    vbalProgressBar1 = new QProgressBar(fraSearch);
+    vbalProgressBar1 = new vbalProgressBar(fraSearch);
     vbalProgressBar1->setObjectName(QStringLiteral("vbalProgressBar1"));
-    vbalProgressBar1->setTextVisible(true);
-    vbalProgressBar1->setAlignment(Qt::AlignCenter);
+    vbalProgressBar1->setShowText(true);
     vbalProgressBar1->hide();
 
     txtSearch->installEventFilter(this);
@@ -184,6 +183,10 @@ void frmMain::Form_Load() {
                                      : QString());
     vbalListViewCtl1->setForeColor(readColour(store, kSettings, QStringLiteral("TextColor"), 0));
 
+    vbalProgressBar1->setForeColor(0);
+    vbalProgressBar1->setBarColor(vbalListViewCtl1->BackColor());
+    vbalProgressBar1->setBarForeColor(vbalListViewCtl1->ForeColor());
+
     const QString romPath = store.GetSetting(kSettings, QStringLiteral("ROMPath"));
     m_sZ26Path = store.GetSetting(kSettings, QStringLiteral("Z26Path"));
 
@@ -250,9 +253,9 @@ void frmMain::RefreshMainList() {
     QCoreApplication::processEvents();
 
     txtSearch->hide();
-    vbalProgressBar1->setMinimum(0);
+    vbalProgressBar1->setMin(0);
     if (total > 0)
-        vbalProgressBar1->setMaximum(static_cast<int>(std::nearbyint(total)));
+        vbalProgressBar1->setMax(static_cast<int>(std::nearbyint(total)));
     vbalProgressBar1->setValue(0);
     vbalProgressBar1->show();
 
@@ -262,14 +265,14 @@ void frmMain::RefreshMainList() {
     QStringList folders;
     std::vector<RomListModel::Row> rows;
     int done = 0;
-    int shownPercent = -1;
+    long long shownPercent = -1;
     const auto advance = [&](int value) {
-        const int range = vbalProgressBar1->maximum() - vbalProgressBar1->minimum();
-        const int percent = range > 0 ? static_cast<int>(100.0 * value / range) : 0;
-        // The bar is only touched when its shown percentage changes.
+        vbalProgressBar1->setValue(value);
+        // The percent text only changes when its rounded value does.
+        const long long percent = std::llround(vbalProgressBar1->Percent());
         if (percent != shownPercent) {
             shownPercent = percent;
-            vbalProgressBar1->setValue(value);
+            vbalProgressBar1->setText(QString::number(percent) + u'%');
         }
     };
     for (Listing& listing : listings) {
@@ -282,10 +285,9 @@ void frmMain::RefreshMainList() {
             if (search.isEmpty() || MatchesSearch(search, name))
                 rows.push_back({std::move(name), folderIndex});
         }
+        advance(count + done);
         done += count;
-        advance(done);
     }
-    vbalProgressBar1->setValue(done);
     m_listModel->setRows(std::move(folders), std::move(rows));
 
     const int k = m_listModel->rowCount();

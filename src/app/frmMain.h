@@ -14,8 +14,8 @@ class QGroupBox;
 class QLabel;
 class QLineEdit;
 class QMenu;
-class QProgressBar;
 class RomListModel;
+class vbalProgressBar;
 
 // The main window: the ROM list, the search box and the menus.
 class frmMain : public QMainWindow {
@@ -39,7 +39,7 @@ public:
     ListView* vbalListViewCtl1 = nullptr;
     QGroupBox* fraSearch = nullptr;
     QLineEdit* txtSearch = nullptr;
-    QProgressBar* vbalProgressBar1 = nullptr;
+    vbalProgressBar* vbalProgressBar1 = nullptr;
     QLabel* picBack = nullptr;
     FileLister File1;
 

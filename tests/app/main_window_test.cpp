@@ -5,11 +5,11 @@
 #include "settings/frmSettings.h"
 #include "ui/Twips.h"
 
+#include "ui/vbalProgressBar.h"
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
-#include <QProgressBar>
 #include <QTabWidget>
 
 #include <gtest/gtest.h>

@@ -5,9 +5,9 @@
 #include "ui/ListView.h"
 #include "ui/cTextBoxXP.h"
 
+#include "ui/vbalProgressBar.h"
 #include <QGroupBox>
 #include <QLineEdit>
-#include <QProgressBar>
 #include <QTest>
 
 #include <gtest/gtest.h>
@@ -71,8 +71,8 @@ TEST_F(RefreshTest, DisabledFolderBetweenEnabledOnesIsNeitherCountedNorListed) {
     EXPECT_EQ(names(), (QStringList{"a.bin", "d.bin"}));
     search("bin");
     EXPECT_EQ(w.windowTitle(), "lum - 2 Matches out of 2");
-    EXPECT_EQ(w.vbalProgressBar1->value(), 2); // the bar ends at the total
-    EXPECT_EQ(w.vbalProgressBar1->maximum(), 2);
+    EXPECT_EQ(w.vbalProgressBar1->Value(), 2); // the bar ends at the total
+    EXPECT_EQ(w.vbalProgressBar1->Max(), 2);
 }
 
 TEST_F(RefreshTest, AnEmptyPathEndsTheFolderList) {
