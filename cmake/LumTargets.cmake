@@ -1,3 +1,17 @@
+# When the glob finds a new file, AUTOMOC must scan again, but this CMake's Ninja rules do
+# not rerun it when only its file list changed; removing its timestamp makes it run.
+function(lum_rerun_moc_on_new_files target sources)
+    set(list_file ${CMAKE_CURRENT_BINARY_DIR}/${target}_sources.txt)
+    set(previous "")
+    if(EXISTS ${list_file})
+        file(READ ${list_file} previous)
+    endif()
+    if(NOT previous STREQUAL "${sources}")
+        file(WRITE ${list_file} "${sources}")
+        file(REMOVE ${CMAKE_CURRENT_BINARY_DIR}/${target}_autogen/timestamp)
+    endif()
+endfunction()
+
 # One static library per subsystem folder; its sources are the folder's files.
 function(lum_subsystem name)
     cmake_parse_arguments(ARG "" "" "DEPS" ${ARGN})
@@ -11,6 +25,7 @@ function(lum_subsystem name)
         add_library(lum_${name} STATIC ${sources})
         target_include_directories(lum_${name} PUBLIC ${PROJECT_SOURCE_DIR}/src ${PROJECT_BINARY_DIR}/generated)
         target_link_libraries(lum_${name} PUBLIC ${ARG_DEPS})
+        lum_rerun_moc_on_new_files(lum_${name} "${sources}")
     else()
         # A subsystem that has no code yet still exists as a name to link against.
         add_library(lum_${name} INTERFACE)
@@ -30,6 +45,7 @@ function(lum_test_folder name)
     add_executable(test_${name} ${sources})
     set_target_properties(test_${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
     target_link_libraries(test_${name} PRIVATE lum_testsupport ${ARG_DEPS} GTest::gtest)
+    lum_rerun_moc_on_new_files(test_${name} "${sources}")
     gtest_discover_tests(test_${name}
         PROPERTIES ENVIRONMENT "QT_QPA_PLATFORM=offscreen;LUM_SOURCE_DIR=${PROJECT_SOURCE_DIR}"
         DISCOVERY_TIMEOUT 60)

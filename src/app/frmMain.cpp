@@ -1,12 +1,16 @@
 #include "app/frmMain.h"
 
 #include "app/MenuIcons.h"
+#include "library/CCRC32.h"
+#include "library/GameDatabase.h"
 #include "library/RomListModel.h"
 #include "library/Search.h"
 #include "platform/Dialogs.h"
 #include "platform/FileSystem.h"
 #include "platform/Platform.h"
 #include "platform/SettingsStore.h"
+#include "platform/Shell.h"
+#include "platform/WebAddresses.h"
 #include "settings/frmSettings.h"
 #include "ui/ListView.h"
 #include "ui/OleColor.h"
@@ -129,12 +133,13 @@ void frmMain::createMenus() {
     connect(mnuSettingsConfiguration, &QAction::triggered, this,
             &frmMain::mnuSettingsConfiguration_Click);
     connect(mnuMainRefresh, &QAction::triggered, this, &frmMain::mnuMainRefresh_Click);
+    connect(mnuMainGameInfo, &QAction::triggered, this, &frmMain::mnuMainGameInfo_Click);
 
     // Commands whose work is not part of the program yet stay visible but disabled.
     for (QAction* pending :
          {mnuFileLoadSettings, mnuFileSaveSettings, mnuTextColor, mnuBackImgChange,
           mnuBackColorChange, mnuBackImgEnabled, mnuAboutz26Readme, mnuAboutCopying,
-          mnuAboutz26HomePage, mnuAboutlumAbout, mnuAboutlumHomePage, mnuMainGameInfo})
+          mnuAboutz26HomePage, mnuAboutlumAbout, mnuAboutlumHomePage})
         pending->setEnabled(false);
 }
 
@@ -153,6 +158,7 @@ void frmMain::assignMenuIcons() {
 
 void frmMain::Form_Load() {
     assignMenuIcons();
+    mcrc32 = std::make_unique<CCRC32>(m_platform.dialogs);
 
     const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
     if (!FileExist(defaultFile)) {
@@ -441,5 +447,26 @@ void frmMain::vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPo
     if (button != Qt::RightButton)
         return;
     mnuMainGameInfo->setVisible(false);
+    if (const QString path = selectedRowPath(); !path.isEmpty() && LookupSoftwareID(path) != 0)
+        mnuMainGameInfo->setVisible(true);
     mnuMainPopup->popup(globalPos);
+}
+
+void frmMain::mnuMainGameInfo_Click() {
+    const QString path = selectedRowPath();
+    if (path.isEmpty())
+        return;
+    const qint16 id = LookupSoftwareID(path);
+    m_platform.shell.OpenUrl(QString(web::kGameInfoSite) +
+                             QStringLiteral("/software_page.html?SoftwareID=") +
+                             QString::number(id));
+}
+
+qint16 frmMain::LookupSoftwareID(const QString& path) {
+    return ::LookupSoftwareID(*mcrc32, m_platform.programFolder + QStringLiteral("/CRCID.dat"),
+                              path);
+}
+
+QString frmMain::selectedRowPath() const {
+    return m_listModel->rowPath(vbalListViewCtl1->selectedRow());
 }

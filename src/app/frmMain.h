@@ -14,6 +14,7 @@ class QGroupBox;
 class QLabel;
 class QLineEdit;
 class QMenu;
+class CCRC32;
 class RomListModel;
 class vbalProgressBar;
 
@@ -88,8 +89,14 @@ private:
     void mnuFileExit_Click();
     void mnuSettingsConfiguration_Click();
     void mnuMainRefresh_Click();
+    void mnuMainGameInfo_Click();
+    // The software ID of a ROM file in the game database beside the program, or 0.
+    qint16 LookupSoftwareID(const QString& path);
+    // The selected row's full path, or the empty text when no row is selected.
+    QString selectedRowPath() const;
 
     Platform& m_platform;
     std::unique_ptr<frmSettings> m_settings;
+    std::unique_ptr<CCRC32> mcrc32;
     RomListModel* m_listModel = nullptr;
 };

@@ -1,5 +1,7 @@
 #include "AppFixture.h"
 
+#include "library/CCRC32.h"
+#include "library/GameDatabase.h"
 #include "library/RomListModel.h"
 #include "settings/frmSettings.h"
 #include "ui/ListView.h"
@@ -8,6 +10,7 @@
 #include "ui/vbalProgressBar.h"
 #include <QGroupBox>
 #include <QLineEdit>
+#include <QMenu>
 #include <QTest>
 
 #include <gtest/gtest.h>
@@ -161,4 +164,36 @@ TEST(SearchBox, DoubleClickShowsTheSearchHelp) {
               "You can use the following logic operations in your search: AND, OR, XOR, NOT\r\n"
               "But the Operations must be capitalized.\r\n"
               "for example...  pac AND man... asteroids AND NOT [pal].");
+}
+
+TEST_F(RefreshTest, RightClickOffersGameInfoOnlyForAnIdentifiedRow) {
+    const QString folder = app.romFolder("roms", {"Unknown.bin"});
+    app.fake.writeFile("roms/Known.bin", "known rom bytes");
+    app.storeFolder(1, folder);
+    CCRC32 crc(app.fake.dialogs);
+    crc.setInputFileName(folder + "/Known.bin");
+    GameRecord record;
+    record.SoftwareID = 57;
+    record.CRC = crc.GetCRCFromFile();
+    app.fake.writeFile("program/CRCID.dat", encodeGameDatabase({record}));
+    frmMain& w = app.load();
+    ASSERT_EQ(names(), (QStringList{"Known.bin", "Unknown.bin"}));
+
+    auto rightClick = [&](int row) {
+        QWidget* viewport = w.vbalListViewCtl1->viewport();
+        const QRect r = w.vbalListViewCtl1->visualRect(w.listModel().index(row, 0));
+        QTest::mouseClick(viewport, Qt::RightButton, {}, r.center());
+        const bool shown = w.mnuMainPopup->isVisible();
+        w.mnuMainPopup->hide();
+        return shown;
+    };
+    EXPECT_TRUE(rightClick(1));
+    EXPECT_TRUE(w.mnuMainRefresh->isVisible());
+    EXPECT_FALSE(w.mnuMainGameInfo->isVisible());
+    EXPECT_TRUE(rightClick(0));
+    EXPECT_TRUE(w.mnuMainGameInfo->isVisible());
+    w.mnuMainGameInfo->trigger();
+    ASSERT_EQ(app.fake.shell.urls.size(), 1);
+    EXPECT_TRUE(app.fake.shell.urls[0].endsWith("/software_page.html?SoftwareID=57"));
+    EXPECT_TRUE(app.fake.dialogs.boxes.empty());
 }
