@@ -375,8 +375,6 @@ void vbalProgressBar::drawText(QPainter& p, const QRect& r, quint32 ole) const {
 
 void vbalProgressBar::drawThemed(QPainter& p) {
     const QRect all(0, 0, width(), height());
-    p.fillRect(all, palette().window());
-
     QStyleOptionProgressBar option;
     initStyleOption(option);
     const QRect contents = track();
@@ -386,9 +384,25 @@ void vbalProgressBar::drawThemed(QPainter& p) {
     option.maximum = std::max(1, across ? contents.width() : contents.height());
     option.progress = across ? bar.width() : bar.height();
 
+    // The empty track depends on the size and the look only, and takes the style longer to
+    // draw than all the rest; it is drawn once and copied after that.
+    const qreal dpr = p.device() != nullptr ? p.device()->devicePixelRatioF() : 1.0;
+    const GrooveKey key{size(), dpr, isEnabled(), isActiveWindow()};
+    if (m_groove.isNull() || !(m_grooveKey == key)) {
+        m_groove = QImage(static_cast<int>(std::ceil(width() * dpr)),
+                          static_cast<int>(std::ceil(height() * dpr)),
+                          QImage::Format_ARGB32_Premultiplied);
+        m_groove.setDevicePixelRatio(dpr);
+        QPainter gp(&m_groove);
+        gp.fillRect(all, palette().window());
+        QStyleOptionProgressBar groove = option;
+        groove.rect = style()->subElementRect(QStyle::SE_ProgressBarGroove, &option, this);
+        style()->drawControl(QStyle::CE_ProgressBarGroove, &groove, &gp, this);
+        m_grooveKey = key;
+    }
+    p.drawImage(QPointF(0, 0), m_groove);
+
     QStyleOptionProgressBar part = option;
-    part.rect = style()->subElementRect(QStyle::SE_ProgressBarGroove, &option, this);
-    style()->drawControl(QStyle::CE_ProgressBarGroove, &part, &p, this);
     if (m_bar.has()) {
         if (!bar.isEmpty()) {
             p.save();
@@ -472,11 +486,14 @@ void vbalProgressBar::paintEvent(QPaintEvent*) {
 
 void vbalProgressBar::changeEvent(QEvent* event) {
     switch (event->type()) {
+    case QEvent::FontChange: // the Font property's setter
+        redraw();
+        break;
     case QEvent::StyleChange:
-    case QEvent::FontChange:
     case QEvent::PaletteChange:
         m_themedTrackFor = QSize();
-        redraw();
+        m_groove = QImage();
+        update();
         break;
     default:
         break;

@@ -107,7 +107,8 @@ public:
     void drawControl(QPainter& painter);
 
 signals:
-    // Value was set with the mouse.
+    // Value was set with the mouse: once for every press of the left button, and once for
+    // every drag step that moves it.
     void Change();
     void DblClick();
     void KeyPress(int KeyAscii);
@@ -174,4 +175,14 @@ private:
     // The style's contents area is asked for once per size and style, not once per Value.
     mutable QRect m_themedTrack;
     mutable QSize m_themedTrackFor;
+    // The style's empty track as last drawn, and what it was drawn for.
+    struct GrooveKey {
+        QSize size;
+        qreal dpr = 0;
+        bool enabled = false;
+        bool active = false;
+        bool operator==(const GrooveKey&) const = default;
+    };
+    QImage m_groove;
+    GrooveKey m_grooveKey;
 };
