@@ -44,9 +44,11 @@ bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename
     if (!reply->isFinished())
         loop.exec(QEventLoop::ExcludeUserInputEvents);
 
-    const QByteArray rest = reply->readAll();
-    if (!writeFailed && target.write(rest) != rest.size())
-        writeFailed = true;
+    if (reply->isOpen()) {
+        const QByteArray rest = reply->readAll();
+        if (!writeFailed && target.write(rest) != rest.size())
+            writeFailed = true;
+    }
 
     const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
     const bool ok =

@@ -98,8 +98,8 @@ void FakeRegistry::set(quint32 root, const QString& keyName, const QString& valu
 
 FakePlatform::FakePlatform()
     : store(m_dir.path() + QStringLiteral("/config/lum/lum.ini")),
-      platform{store, dialogs, shell, m_dir.path() + QStringLiteral("/program"), network,
-               registry} {
+      platform{store,   dialogs, shell, m_dir.path() + QStringLiteral("/program"),
+               network, registry} {
     QDir().mkpath(programFolder());
 }
 

@@ -81,8 +81,7 @@ public:
     };
     std::optional<RegistryValue> QueryValue(quint32 root, const QString& keyName,
                                             const QString& valueName) override;
-    void set(quint32 root, const QString& keyName, const QString& valueName,
-             RegistryValue value);
+    void set(quint32 root, const QString& keyName, const QString& valueName, RegistryValue value);
 
     std::vector<std::pair<Lookup, RegistryValue>> values;
     std::vector<Lookup> lookups;

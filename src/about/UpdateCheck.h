@@ -1,0 +1,46 @@
+#pragma once
+
+#include "about/UpdateDescription.h"
+
+#include <QPointer>
+#include <QString>
+#include <QWidget>
+
+struct Platform;
+
+// The update check behind the About window's Update and Forum buttons: fetch the update
+// description file, find this product's section, then either open its forum page or
+// report the version situation and, when the user agrees, fetch and start a newer
+// installer. Runs synchronously; the downloads hold back user input while they last.
+class UpdateCheck {
+public:
+    enum class Outcome {
+        Finished,
+        // The installer was started: the program must end at once, saving nothing.
+        EndProgram,
+    };
+
+    // `serverBase` is the scheme and host that serve the description file and the forum,
+    // without a trailing slash.
+    UpdateCheck(Platform& platform, QWidget* owner, QString serverBase,
+                ProductVersion product = thisProduct());
+
+    Outcome Run(bool forumRequest);
+
+    // Where the description file is kept: the program folder's "tmp".
+    QString localCopyPath() const;
+    // Where installers go: the program folder's "Update".
+    QString updateFolder() const;
+
+private:
+    Outcome runUpdate(const UpdateSection& section);
+    void openForum(const UpdateSection& section);
+    bool download(const QString& url, const QString& localFilename);
+    void reportFailedCheck(const QString& text);
+
+    Platform& m_platform;
+    // Message boxes sit over the owner for as long as it exists.
+    QPointer<QWidget> m_owner;
+    QString m_serverBase;
+    ProductVersion m_product;
+};
