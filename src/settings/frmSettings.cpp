@@ -1,39 +1,69 @@
 #include "settings/frmSettings.h"
 
+#include "platform/Dialogs.h"
 #include "platform/Platform.h"
 #include "platform/SettingsStore.h"
+#include "settings/DefaultPaths.h"
+#include "ui/OleColor.h"
+#include "ui/PictureBox.h"
 #include "ui/Twips.h"
 
+#include <QCheckBox>
 #include <QCloseEvent>
+#include <QComboBox>
+#include <QDir>
+#include <QDropEvent>
+#include <QFileInfo>
 #include <QGroupBox>
+#include <QHeaderView>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMenu>
+#include <QMimeData>
 #include <QPushButton>
+#include <QSignalBlocker>
 #include <QStyle>
 #include <QTabBar>
 #include <QTabWidget>
+#include <QTreeWidget>
+#include <QUrl>
 
 namespace {
 
 constexpr double kTabWidthTwips = 6495;
 constexpr double kTabHeightTwips = 4095;
 constexpr double kSideStripWidthTwips = 495;
+constexpr double kCountColumnTwips = 1000;
+
+const QString kSettings = QStringLiteral("Settings");
+const QString kSetpos = QStringLiteral("setpos");
+const QString kDefaultPathsKey = QStringLiteral("DefaultPaths");
 
 struct TabInfo {
     const char* key;
     const char* caption;
-    const char* page;
     QStyle::StandardPixmap icon;
 };
 
 constexpr TabInfo kTabs[] = {
-    {"Settings", "Settings", "picSettings", QStyle::SP_FileDialogDetailedView},
-    {"Controls", "Controls", "picControls", QStyle::SP_ComputerIcon},
-    {"PaddlesAudio", "Paddles / Audio", "picPaddlesAudio", QStyle::SP_MediaVolume},
-    {"Video", "Video", "picVideo", QStyle::SP_DesktopIcon},
-    {"Debug", "Debugging", "picDebug", QStyle::SP_MessageBoxWarning},
-    {"DefaultPaths", "Default Paths", "picDefPaths", QStyle::SP_DirIcon},
+    {"Settings", "Settings", QStyle::SP_FileDialogDetailedView},
+    {"Controls", "Controls", QStyle::SP_ComputerIcon},
+    {"PaddlesAudio", "Paddles / Audio", QStyle::SP_MediaVolume},
+    {"Video", "Video", QStyle::SP_DesktopIcon},
+    {"Debug", "Debugging", QStyle::SP_MessageBoxWarning},
+    {"DefaultPaths", "Default Paths", QStyle::SP_DirIcon},
 };
+
+// The first dropped item as a local path, or the empty text when the drop carries no
+// local file or folder (a web address, plain text).
+QString firstDroppedPath(const QMimeData* data) {
+    if (data == nullptr || !data->hasUrls())
+        return QString();
+    const QList<QUrl> urls = data->urls();
+    if (urls.isEmpty() || !urls.first().isLocalFile())
+        return QString();
+    return QDir::cleanPath(urls.first().toLocalFile());
+}
 
 } // namespace
 
@@ -42,46 +72,55 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
     setObjectName(QStringLiteral("frmSettings"));
     setWindowTitle(QStringLiteral("Settings"));
 
-    picSideText = new QWidget(this);
+    picSideText = new PictureBox(this);
     picSideText->setObjectName(QStringLiteral("picSideText"));
+    // The caption runs up the dark end of the gradient.
+    picSideText->setForeColor(kOleWhite);
+    QFont sideFont = picSideText->font();
+    sideFont.setBold(true);
+    sideFont.setPointSize(10);
+    picSideText->setFont(sideFont);
 
     vbalDTabControl1 = new QTabWidget(this);
     vbalDTabControl1->setObjectName(QStringLiteral("vbalDTabControl1"));
 
     QWidget** pages[] = {&picSettings, &picControls, &picPaddlesAudio,
                          &picVideo,    &picDebug,    &picDefPaths};
-    for (size_t i = 0; i < std::size(kTabs); ++i) {
-        QWidget* page = new QWidget;
-        page->setObjectName(QLatin1String(kTabs[i].page));
-        *pages[i] = page;
+    const char* pageNames[] = {"picSettings", "picControls", "picPaddlesAudio",
+                               "picVideo",    "picDebug",    "picDefPaths"};
+    for (size_t i = 0; i < std::size(pages); ++i) {
+        *pages[i] = new QWidget;
+        (*pages[i])->setObjectName(QLatin1String(pageNames[i]));
     }
+    createSettingsPage();
+    createControlsPage();
+    createPaddlesAudioPage();
+    createVideoPage();
+    createDebugPage();
+    createDefaultPathsPage();
+    createGraveyard();
 
-    fraConfig = new QGroupBox(QStringLiteral("Save/Load settings"), picSettings);
-    fraConfig->setObjectName(QStringLiteral("fraConfig"));
-    cmdSaveDat = new QPushButton(QStringLiteral("&Save"), fraConfig);
-    cmdSaveDat->setObjectName(QStringLiteral("cmdSaveDat"));
-    cmdLoadDat = new QPushButton(QStringLiteral("&Load"), fraConfig);
-    cmdLoadDat->setObjectName(QStringLiteral("cmdLoadDat"));
-    lblConfig = new QLabel(fraConfig);
-    lblConfig->setObjectName(QStringLiteral("lblConfig"));
-    lblConfig->setWordWrap(true);
-    fraConfig->setGeometry(twips::toPixelsX(120), twips::toPixelsY(120), twips::toPixelsX(6135),
-                           twips::toPixelsY(1095));
-    cmdSaveDat->setGeometry(twips::toPixelsX(120), twips::toPixelsY(300), twips::toPixelsX(1095),
-                            twips::toPixelsY(375));
-    cmdLoadDat->setGeometry(twips::toPixelsX(1320), twips::toPixelsY(300),
-                            twips::toPixelsX(1095), twips::toPixelsY(375));
-    lblConfig->setGeometry(twips::toPixelsX(2520), twips::toPixelsY(240), twips::toPixelsX(3495),
-                           twips::toPixelsY(735));
+    // Drops and keys of the Default Paths page; the balloon anchors follow the controls
+    // whose tips they carry.
+    for (QObject* watched :
+         {static_cast<QObject*>(txtDefPathz26), static_cast<QObject*>(vbalListDefPaths),
+          static_cast<QObject*>(vbalListDefPaths->viewport()),
+          static_cast<QObject*>(comboVideoMode), static_cast<QObject*>(chkIPCStella)})
+        watched->installEventFilter(this);
 
-    fraDefPathFilter = new QGroupBox(QStringLiteral("ROM Filter"), picDefPaths);
-    fraDefPathFilter->setObjectName(QStringLiteral("fraDefPathFilter"));
-    txtDefPathFilter = new QLineEdit(fraDefPathFilter);
-    txtDefPathFilter->setObjectName(QStringLiteral("txtDefPathFilter"));
-    fraDefPathFilter->setGeometry(twips::toPixelsX(120), twips::toPixelsY(120),
-                                  twips::toPixelsX(6135), twips::toPixelsY(675));
-    txtDefPathFilter->setGeometry(twips::toPixelsX(120), twips::toPixelsY(270),
-                                  twips::toPixelsX(5895), twips::toPixelsY(315));
+    connect(vbalDTabControl1, &QTabWidget::tabBarClicked, this,
+            &frmSettings::vbalDTabControl1_TabClick);
+    connect(vbalDTabControl1, &QTabWidget::currentChanged, this,
+            &frmSettings::vbalDTabControl1_TabSelected);
+    connect(txtDefPathFilter, &QLineEdit::textChanged, this, &frmSettings::txtDefPathFilter_Change);
+    connect(cmdAddZ26Path, &QPushButton::clicked, this, &frmSettings::cmdAddZ26Path_Click);
+    connect(mnuROMSRemove, &QAction::triggered, this, &frmSettings::mnuROMSRemove_Click);
+    connect(mnuROMSRefresh, &QAction::triggered, this, &frmSettings::mnuROMSRefresh_Click);
+    connect(mnuROMSAdd, &QAction::triggered, this, &frmSettings::mnuROMSAdd_Click);
+    connect(vbalListDefPaths, &QWidget::customContextMenuRequested, this,
+            [this](const QPoint& pos) { vbalListDefPaths_MouseDown(Qt::RightButton, pos); });
+    connect(vbalListDefPaths, &QTreeWidget::itemChanged, this,
+            &frmSettings::vbalListDefPaths_ItemChanged);
 
     Form_Load();
 }
@@ -89,19 +128,28 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
 frmSettings::~frmSettings() = default;
 
 void frmSettings::Form_Load() {
-    txtDefPathFilter->setText(m_platform.store.GetSetting(
-        QStringLiteral("Settings"), QStringLiteral("ROMFilter"), QStringLiteral("*.bin")));
+    txtDefPathFilter->setText(m_platform.store.GetSetting(kSettings, QStringLiteral("ROMFilter"),
+                                                          QStringLiteral("*.bin")));
 
-    const int stripWidth = twips::toPixelsX(kSideStripWidthTwips);
-    const int tabWidth = twips::toPixelsX(kTabWidthTwips);
-    const int tabHeight = twips::toPixelsY(kTabHeightTwips);
-    vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
-    resize(stripWidth + tabWidth + twips::toPixelsX(100), tabHeight + twips::toPixelsY(500));
-    picSideText->setGeometry(0, 0, stripWidth, height());
+    // The path column takes what the count column leaves, so both stay in view.
+    vbalListDefPaths->setColumnCount(2);
+    vbalListDefPaths->setHeaderLabels({QStringLiteral("Path"), QStringLiteral("# ROM's")});
+    vbalListDefPaths->headerItem()->setToolTip(0, QStringLiteral("ROM's Path"));
+    vbalListDefPaths->headerItem()->setToolTip(1, QStringLiteral("The number of ROM's found"));
+    QHeaderView* header = vbalListDefPaths->header();
+    header->setStretchLastSection(false);
+    header->setSectionResizeMode(0, QHeaderView::Stretch);
+    header->setSectionResizeMode(1, QHeaderView::Interactive);
+    header->resizeSection(1, twips::toPixelsX(kCountColumnTwips));
+
+    m_logo.setDrawingObject(picSideText);
+    m_logo.setCaption(QStringLiteral("Settings"));
+    m_logo.setStartColor(0);
+    m_logo.setEndColor(kOleButtonFace);
 
     const SettingsStore& store = m_platform.store;
-    move(twips::toPixelsX(readSingle(store, QStringLiteral("setpos"), QStringLiteral("left"), 250)),
-         twips::toPixelsY(readSingle(store, QStringLiteral("setpos"), QStringLiteral("top"), 250)));
+    move(twips::toPixelsX(readSingle(store, kSetpos, QStringLiteral("left"), 250)),
+         twips::toPixelsY(readSingle(store, kSetpos, QStringLiteral("top"), 250)));
 
     QWidget* pages[] = {picSettings, picControls, picPaddlesAudio, picVideo, picDebug, picDefPaths};
     for (size_t i = 0; i < std::size(kTabs); ++i) {
@@ -109,11 +157,29 @@ void frmSettings::Form_Load() {
                                                    QLatin1String(kTabs[i].caption));
         vbalDTabControl1->tabBar()->setTabData(index, QLatin1String(kTabs[i].key));
     }
+    placeTabControl();
+
+    LoadDefaultPaths();
+    fillComboLists();
+}
+
+void frmSettings::placeTabControl() {
+    // The tab control's size in twips, grown where this platform's font needs more room
+    // for the tabs or a page, so that every tab shows at once and nothing is cut off.
+    const QSize content = vbalDTabControl1->minimumSizeHint().expandedTo(
+        QSize(vbalDTabControl1->tabBar()->sizeHint().width() + 4, 0));
+    const int tabWidth = std::max(twips::toPixelsX(kTabWidthTwips), content.width());
+    const int tabHeight = std::max(twips::toPixelsY(kTabHeightTwips), content.height());
+    const int stripWidth = twips::toPixelsX(kSideStripWidthTwips);
+    vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
+    // The pages are laid out for this size, so the window keeps it.
+    setFixedSize(stripWidth + tabWidth + twips::toPixelsX(100), tabHeight + twips::toPixelsY(500));
+    picSideText->setGeometry(0, 0, stripWidth, height());
 }
 
 void frmSettings::SelectTab(const QString& key) {
     for (int i = 0; i < vbalDTabControl1->count(); ++i) {
-        if (vbalDTabControl1->tabBar()->tabData(i).toString() == key) {
+        if (tabKey(i) == key) {
             vbalDTabControl1->setCurrentIndex(i);
             return;
         }
@@ -121,7 +187,28 @@ void frmSettings::SelectTab(const QString& key) {
 }
 
 QString frmSettings::SelectedTabKey() const {
-    return vbalDTabControl1->tabBar()->tabData(vbalDTabControl1->currentIndex()).toString();
+    return tabKey(vbalDTabControl1->currentIndex());
+}
+
+QString frmSettings::tabKey(int index) const {
+    return vbalDTabControl1->tabBar()->tabData(index).toString();
+}
+
+void frmSettings::vbalDTabControl1_TabClick(int index) {
+    // Clicking the page already shown reloads it too; a change of page reloads through
+    // vbalDTabControl1_TabSelected.
+    if (index == vbalDTabControl1->currentIndex() && tabKey(index) == kDefaultPathsKey)
+        LoadDefaultPaths();
+}
+
+void frmSettings::vbalDTabControl1_TabSelected(int index) {
+    if (index < 0)
+        return;
+    // Folders may have vanished from disk since the page was last filled.
+    if (tabKey(index) == kDefaultPathsKey)
+        LoadDefaultPaths();
+    m_logo.setCaption(vbalDTabControl1->tabText(index));
+    m_logo.Draw();
 }
 
 void frmSettings::Unload() {
@@ -142,8 +229,244 @@ void frmSettings::closeEvent(QCloseEvent* event) {
 
 void frmSettings::Form_Unload() {
     SettingsStore& store = m_platform.store;
-    store.SaveSetting(QStringLiteral("setpos"), QStringLiteral("top"),
-                      singleText(twips::fromPixelsY(y())));
-    store.SaveSetting(QStringLiteral("setpos"), QStringLiteral("left"),
-                      singleText(twips::fromPixelsX(x())));
+    store.SaveSetting(kSetpos, QStringLiteral("top"), singleText(twips::fromPixelsY(y())));
+    store.SaveSetting(kSetpos, QStringLiteral("left"), singleText(twips::fromPixelsX(x())));
+    SaveDefaultPaths();
+}
+
+void frmSettings::resizeEvent(QResizeEvent* event) {
+    QWidget::resizeEvent(event);
+    Form_Resize();
+}
+
+void frmSettings::Form_Resize() {
+    if (isMinimized())
+        return;
+    picSideText->setGeometry(0, 0, picSideText->width(), height());
+    m_logo.Draw();
+}
+
+bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
+    const bool bFolderList = watched == vbalListDefPaths->viewport();
+    const bool bZ26Box = watched == txtDefPathz26;
+    if (bFolderList || bZ26Box) {
+        switch (event->type()) {
+        case QEvent::DragEnter:
+        case QEvent::DragMove: {
+            auto* drag = static_cast<QDropEvent*>(event);
+            if (firstDroppedPath(drag->mimeData()).isEmpty())
+                drag->ignore();
+            else
+                drag->acceptProposedAction();
+            return true;
+        }
+        case QEvent::Drop: {
+            auto* drop = static_cast<QDropEvent*>(event);
+            drop->acceptProposedAction();
+            if (bFolderList)
+                vbalListDefPaths_OLEDragDrop(drop->mimeData());
+            else
+                txtDefPathz26_OLEDragDrop(drop->mimeData());
+            return true;
+        }
+        default:
+            break;
+        }
+    } else if (watched == vbalListDefPaths && event->type() == QEvent::KeyPress) {
+        const int key = static_cast<QKeyEvent*>(event)->key();
+        if (key == Qt::Key_Delete || key == Qt::Key_F5 || key == Qt::Key_Return ||
+            key == Qt::Key_Enter) {
+            vbalListDefPaths_KeyDown(key);
+            return true;
+        }
+    } else if (event->type() == QEvent::Move || event->type() == QEvent::Resize) {
+        if (watched == comboVideoMode)
+            txtVidModeBalloon->setGeometry(comboVideoMode->geometry());
+        else if (watched == chkIPCStella)
+            txtIPC4Balloon->setGeometry(chkIPCStella->geometry());
+    }
+    return QWidget::eventFilter(watched, event);
+}
+
+// ---- Default Paths page ----
+
+QTreeWidgetItem* frmSettings::selectedRomRow() const {
+    const QList<QTreeWidgetItem*> rows = vbalListDefPaths->selectedItems();
+    return rows.isEmpty() ? nullptr : rows.first();
+}
+
+void frmSettings::addRomRow(const QString& path, bool bEnabled) {
+    const QSignalBlocker quiet(vbalListDefPaths);
+    auto* row = new QTreeWidgetItem(vbalListDefPaths);
+    row->setFlags(row->flags() | Qt::ItemIsUserCheckable);
+    row->setText(0, path);
+    row->setToolTip(0, QDir::toNativeSeparators(path));
+    row->setTextAlignment(1, Qt::AlignRight | Qt::AlignVCenter);
+    row->setCheckState(0, bEnabled ? Qt::Checked : Qt::Unchecked);
+}
+
+void frmSettings::recountRomRows() {
+    const QSignalBlocker quiet(vbalListDefPaths);
+    for (int i = 0; i < vbalListDefPaths->topLevelItemCount(); ++i) {
+        QTreeWidgetItem* row = vbalListDefPaths->topLevelItem(i);
+        FileROM.setPath(row->text(0));
+        row->setText(1, QString::number(FileROM.ListCount()));
+    }
+}
+
+void frmSettings::LoadDefaultPaths() {
+    {
+        const QSignalBlocker quiet(vbalListDefPaths);
+        vbalListDefPaths->clear();
+    }
+    // The stored flags come back with the rows; a reload that cleared them would make the
+    // next save disable every folder.
+    for (const RomFolder& folder : loadExistingRomFolders(m_platform.store))
+        addRomRow(folder.path, folder.enabled);
+    // Counts every row with the page's pattern.
+    txtDefPathFilter_Change();
+
+    txtDefPathz26->setText(z26PathForDisplay(m_platform.store.GetSetting(
+        kSettings, QStringLiteral("Z26Path"), m_platform.programFolder)));
+}
+
+void frmSettings::SaveDefaultPaths() {
+    std::vector<RomFolder> folders;
+    folders.reserve(vbalListDefPaths->topLevelItemCount());
+    for (int i = 0; i < vbalListDefPaths->topLevelItemCount(); ++i) {
+        const QTreeWidgetItem* row = vbalListDefPaths->topLevelItem(i);
+        folders.push_back({row->text(0), row->checkState(0) == Qt::Checked});
+    }
+    writeRomFolders(m_platform.store, folders);
+}
+
+void frmSettings::txtDefPathFilter_Change() {
+    const QString pattern = txtDefPathFilter->text();
+    FileROM.setPattern(pattern);
+    recountRomRows();
+    m_platform.store.SaveSetting(kSettings, QStringLiteral("ROMFilter"), pattern);
+}
+
+void frmSettings::vbalListDefPaths_ItemChanged(QTreeWidgetItem*, int column) {
+    // A folder switched on or off reaches the store at once, so the main list's next
+    // refresh follows it and a reload of the page does not undo it.
+    if (column == 0)
+        SaveDefaultPaths();
+}
+
+void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
+    if (bArchive) {
+        m_platform.dialogs.MsgBox(this, QStringLiteral(".rar files aren't supported yet"),
+                                  MsgButtons::Ok, MsgIcon::None);
+    } else if (!path.isEmpty() && QFileInfo(path).isDir()) {
+        // New folders are enabled; the reload below counts the files.
+        addRomRow(path, true);
+    } else {
+        m_platform.dialogs.MsgBox(
+            this, QStringLiteral("That doesn't appear to be a valid folder.\nChoose another one."),
+            MsgButtons::Ok, MsgIcon::None, QStringLiteral("Add Folders Not Files."));
+    }
+    SaveDefaultPaths();
+    LoadDefaultPaths();
+}
+
+void frmSettings::SetZ26Path(const QString& path) {
+    const QString executable = completeZ26Path(path);
+    if (QFileInfo(executable).isFile()) {
+        txtDefPathz26->setText(executable);
+        m_platform.store.SaveSetting(kSettings, QStringLiteral("z26Path"), executable);
+        return;
+    }
+    m_platform.dialogs.MsgBox(
+        this, z26FileName() + QStringLiteral(" doesn't exist in that path. \nChoose another one."),
+        MsgButtons::Ok, MsgIcon::None, QStringLiteral("Non-z26 Folder Chosen."));
+}
+
+void frmSettings::cmdAddZ26Path_Click() {
+    FileDialogRequest request;
+    request.title = QStringLiteral("Choose z26 path");
+    request.initialFolder = m_platform.programFolder;
+    request.filter =
+        QStringLiteral("z26 executable (%1)|%1|All Files (*.*)|*.*").arg(z26FileName());
+    request.filterIndex = 1;
+    request.flags = kFlagPathMustExist | kFlagFileMustExist;
+    const QString chosen = m_platform.dialogs.ShowOpen(this, request);
+    if (!chosen.isEmpty())
+        SetZ26Path(chosen);
+}
+
+void frmSettings::mnuROMSAdd_Click() {
+    // A folder chooser: the folder list takes folders, never files.
+    const QString chosen = m_platform.dialogs.ShowFolder(this, QStringLiteral("Choose ROMs path"),
+                                                         m_platform.programFolder);
+    if (!chosen.isEmpty())
+        AddRomFolder(chosen, false);
+}
+
+void frmSettings::mnuROMSRemove_Click() {
+    QTreeWidgetItem* row = selectedRomRow();
+    if (row == nullptr)
+        return;
+    const int index = vbalListDefPaths->indexOfTopLevelItem(row);
+    const QString path = row->text(0);
+    const MsgResult answer = m_platform.dialogs.MsgBox(
+        this,
+        QStringLiteral("Are you sure you want to remove ") + QDir::toNativeSeparators(path) +
+            QStringLiteral(" from the list?"),
+        MsgButtons::YesNoCancel, MsgIcon::Question, QStringLiteral("Remove Path?"));
+    if (answer != MsgResult::Yes)
+        return;
+    // The question let other events run; remove the row only if it is still the one asked about.
+    QTreeWidgetItem* asked = vbalListDefPaths->topLevelItem(index);
+    if (asked == nullptr || asked->text(0) != path)
+        return;
+    {
+        const QSignalBlocker quiet(vbalListDefPaths);
+        delete asked;
+    }
+    SaveDefaultPaths();
+    LoadDefaultPaths();
+}
+
+void frmSettings::mnuROMSRefresh_Click() {
+    SaveDefaultPaths();
+    LoadDefaultPaths();
+}
+
+void frmSettings::vbalListDefPaths_KeyDown(int key) {
+    switch (key) {
+    case Qt::Key_Delete:
+        mnuROMSRemove_Click();
+        break;
+    case Qt::Key_F5:
+        mnuROMSRefresh_Click();
+        break;
+    case Qt::Key_Return:
+    case Qt::Key_Enter:
+        if (QTreeWidgetItem* row = selectedRomRow())
+            row->setCheckState(0, row->checkState(0) == Qt::Checked ? Qt::Unchecked : Qt::Checked);
+        break;
+    default:
+        break;
+    }
+}
+
+void frmSettings::vbalListDefPaths_MouseDown(Qt::MouseButton button, const QPoint& pos) {
+    if (button != Qt::RightButton)
+        return;
+    const QTreeWidgetItem* row = selectedRomRow();
+    mnuROMSRemove->setVisible(row != nullptr && !row->text(0).isEmpty());
+    mnuROMSPopup->popup(vbalListDefPaths->viewport()->mapToGlobal(pos));
+}
+
+void frmSettings::vbalListDefPaths_OLEDragDrop(const QMimeData* data) {
+    const QString path = firstDroppedPath(data);
+    if (!path.isEmpty())
+        AddRomFolder(path, isArchiveName(path));
+}
+
+void frmSettings::txtDefPathz26_OLEDragDrop(const QMimeData* data) {
+    const QString path = firstDroppedPath(data);
+    if (!path.isEmpty())
+        SetZ26Path(path);
 }

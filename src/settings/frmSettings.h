@@ -1,16 +1,32 @@
 #pragma once
 
+#include "library/FileLister.h"
+#include "ui/cLogo.h"
+
 #include <QWidget>
 
+#include <array>
+
 struct Platform;
+class PictureBox;
+class QAction;
+class QButtonGroup;
+class QCheckBox;
+class QComboBox;
+class QGroupBox;
 class QLabel;
 class QLineEdit;
-class QGroupBox;
+class QMenu;
+class QMimeData;
 class QPushButton;
+class QRadioButton;
 class QTabWidget;
+class QTreeWidget;
+class QTreeWidgetItem;
 
 // The settings window: created hidden by the main window's load and kept until the
-// program ends. Its close box only hides it.
+// program ends. Its close box only hides it; its option controls are the one holder of
+// the emulator options, read whether the window is shown or not.
 class frmSettings : public QWidget {
     Q_OBJECT
 public:
@@ -25,8 +41,31 @@ public:
     // The program's own unload at exit: saves the window's state and really closes it.
     void Unload();
 
-    // Controls other windows reach by name.
-    QWidget* picSideText = nullptr;
+    // The side strip's logo (its caption follows the selected tab).
+    const cLogo& Logo() const { return m_logo; }
+
+    // Default Paths page.
+    void LoadDefaultPaths();
+    void SaveDefaultPaths();
+    void txtDefPathFilter_Change();
+    // Adds one folder; `bArchive` marks a dropped archive, which is refused.
+    void AddRomFolder(const QString& path, bool bArchive);
+    // Validates the emulator path (a folder is completed with the emulator's name) and
+    // stores it, or says why not.
+    void SetZ26Path(const QString& path);
+    void cmdAddZ26Path_Click();
+    void mnuROMSRemove_Click();
+    void mnuROMSRefresh_Click();
+    void mnuROMSAdd_Click();
+    void vbalListDefPaths_KeyDown(int key);
+    // Right button: pops up the list's menu at `pos` (list viewport coordinates), offering
+    // "Remove" only with a selected row.
+    void vbalListDefPaths_MouseDown(Qt::MouseButton button, const QPoint& pos);
+    void vbalListDefPaths_OLEDragDrop(const QMimeData* data);
+    void txtDefPathz26_OLEDragDrop(const QMimeData* data);
+
+    // Frame and tabs.
+    PictureBox* picSideText = nullptr;
     QTabWidget* vbalDTabControl1 = nullptr;
     QWidget* picSettings = nullptr;
     QWidget* picControls = nullptr;
@@ -34,20 +73,182 @@ public:
     QWidget* picVideo = nullptr;
     QWidget* picDebug = nullptr;
     QWidget* picDefPaths = nullptr;
+
+    // Settings page.
     QGroupBox* fraConfig = nullptr;
     QPushButton* cmdSaveDat = nullptr;
     QPushButton* cmdLoadDat = nullptr;
     QLabel* lblConfig = nullptr;
+    QGroupBox* fraVideoMode = nullptr;
+    QComboBox* comboVideoMode = nullptr;
+    QRadioButton* optVMWindow = nullptr;
+    QRadioButton* optVMFull = nullptr;
+    QRadioButton* optVMDefault = nullptr;
+    QLineEdit* txtVidModeBalloon = nullptr;
+    QGroupBox* fraScreenCapture = nullptr;
+    QRadioButton* optSCPCX = nullptr;
+    QRadioButton* optSCBMP = nullptr;
+    QGroupBox* fraDSP = nullptr;
+    QRadioButton* optDSPLow = nullptr;
+    QRadioButton* optDSPHigh = nullptr;
+    QRadioButton* optDSPDefault = nullptr;
+    QGroupBox* fraStart = nullptr;
+    QCheckBox* chkP0Hard = nullptr;
+    QCheckBox* chkP1Hard = nullptr;
+    QCheckBox* chkBW = nullptr;
+
+    // Controls page.
+    QPushButton* cmdLeftControlPic = nullptr;
+    QPushButton* cmdRightControlPic = nullptr;
+    QGroupBox* fraPaddleSens = nullptr;
+    QWidget* BarColorPaddle = nullptr;
+    QGroupBox* fraInactiveControll = nullptr;
+    QCheckBox* chkIPCStella = nullptr;
+    QCheckBox* chkIPCJoystick = nullptr;
+    QCheckBox* chkIPCMouse = nullptr;
+    QCheckBox* chkIPCKeyboard = nullptr;
+    QLineEdit* txtIPC4Balloon = nullptr;
+    QGroupBox* fraRightController = nullptr;
+    QComboBox* comboRightController = nullptr;
+    QGroupBox* fraLeftController = nullptr;
+    QComboBox* comboLeftController = nullptr;
+    QGroupBox* fraLightgun = nullptr;
+    QLabel* lblLightGunAdjust = nullptr;
+    QLineEdit* txtLightGunCycles = nullptr;
+    QLabel* lblLightGunCycles = nullptr;
+    QLineEdit* txtLightGunScan = nullptr;
+    QLabel* lblLightGunScan = nullptr;
+    QCheckBox* chkSwapControl = nullptr;
+
+    // Paddles / Audio page.
+    QGroupBox* fraLowerSens = nullptr;
+    QLabel* lblLowerSens = nullptr;
+    QCheckBox* chkLowerSens = nullptr;
+    QLineEdit* txtLowerSens = nullptr;
+    QLabel* lblLowerSensScan = nullptr;
+    QGroupBox* fraSoundQueue = nullptr;
+    QWidget* BarColorSoundQueue = nullptr;
+    QGroupBox* fraPaddleMouse = nullptr;
+    // "Paddle 0" to "Paddle 3" of each mouse, plus each one's "None".
+    std::array<QRadioButton*, 4> optPaddleM1{};
+    QRadioButton* optPaddleM1None = nullptr;
+    std::array<QRadioButton*, 4> optPaddleM2{};
+    QRadioButton* optPaddleM2None = nullptr;
+    QCheckBox* chkQuiet = nullptr;
+
+    // Video page.
+    QGroupBox* fraScanLines = nullptr;
+    QCheckBox* chkScanLines = nullptr;
+    QLineEdit* txtScanLines = nullptr;
+    QLabel* lblScanLines = nullptr;
+    QGroupBox* fraFrameRate = nullptr;
+    QRadioButton* optFPScustom = nullptr;
+    QLineEdit* txtFPScustom = nullptr;
+    QRadioButton* optFPSmonitor = nullptr;
+    QRadioButton* optFPSDefault = nullptr;
+    QGroupBox* fraNarrow = nullptr;
+    QRadioButton* optNarrowNot = nullptr;
+    QRadioButton* optNarrow1 = nullptr;
+    QRadioButton* optNarrow2 = nullptr;
+    QGroupBox* fraPhos = nullptr;
+    QWidget* BarColorPhos = nullptr;
+    QGroupBox* fraColorPalette = nullptr;
+    QRadioButton* optCPNTSC = nullptr;
+    QRadioButton* optCPPAL = nullptr;
+    QRadioButton* optCPSECAM = nullptr;
+    QRadioButton* optCPDefault = nullptr;
+    QCheckBox* chkPALColorLoss = nullptr;
+    QCheckBox* chkSyncWSound = nullptr;
+    QCheckBox* chkInterlaced = nullptr;
+
+    // Debugging page.
+    QGroupBox* fraLineScan = nullptr;
+    QCheckBox* chkLineScan = nullptr;
+    QLineEdit* txtLineScan = nullptr;
+    QGroupBox* fraGameType = nullptr;
+    QComboBox* comboGT = nullptr;
+    QCheckBox* chkMouseCapture = nullptr;
+    QCheckBox* chkAllow4 = nullptr;
+    QCheckBox* chkFastCopy = nullptr;
+    QCheckBox* chkPrintChecksum = nullptr;
+    QCheckBox* chkCodeTrace = nullptr;
+    QCheckBox* chkShowScanline = nullptr;
+    QGroupBox* fraDOSOutput = nullptr;
+    QCheckBox* chkDOSSwitch = nullptr;
+    QLabel* lblDOSSwitchInstruction = nullptr;
+    QLabel* lblDOSOutput = nullptr;
+    QLineEdit* txtDOSOutput = nullptr;
+
+    // Default Paths page.
     QGroupBox* fraDefPathFilter = nullptr;
     QLineEdit* txtDefPathFilter = nullptr;
+    QGroupBox* fraDefPathz26 = nullptr;
+    QLineEdit* txtDefPathz26 = nullptr;
+    QPushButton* cmdAddZ26Path = nullptr;
+    QGroupBox* fraDefPathRom = nullptr;
+    QTreeWidget* vbalListDefPaths = nullptr;
+    QMenu* mnuROMSPopup = nullptr;
+    QAction* mnuROMSRemove = nullptr;
+    QAction* mnuROMSRefresh = nullptr;
+    QAction* mnuROMSAdd = nullptr;
+
+    // Retired controls: never shown, changed only by loading a configuration file.
+    QWidget* picGraveyard = nullptr;
+    QPushButton* cmdStandard = nullptr;
+    QPushButton* cmdDriving = nullptr;
+    QPushButton* cmdKeyboard = nullptr;
+    QPushButton* cmdMindlink = nullptr;
+    QGroupBox* fraKeyCont = nullptr;
+    QCheckBox* chkKeyLeft = nullptr;
+    QCheckBox* chkKeyRight = nullptr;
+    QGroupBox* fraDriveCont = nullptr;
+    QCheckBox* chkDriveLeft = nullptr;
+    QCheckBox* chkDriveRight = nullptr;
+    QGroupBox* fraPaddleKey = nullptr;
+    std::array<QRadioButton*, 4> optPaddleKey{};
+    QRadioButton* optPaddleKeyNone = nullptr;
+    QGroupBox* fraJoyOptions = nullptr;
+    QRadioButton* optJoyDefault = nullptr;
+    QRadioButton* optJoyKey = nullptr;
+    QRadioButton* optJoyRev = nullptr;
+    QGroupBox* fraMindlink = nullptr;
+    QCheckBox* chkMindlinkLeft = nullptr;
+    QCheckBox* chkMindlinkRight = nullptr;
+    QCheckBox* chkLightGun = nullptr;
 
 protected:
     void closeEvent(QCloseEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
+    void createSettingsPage();
+    void createControlsPage();
+    void createPaddlesAudioPage();
+    void createVideoPage();
+    void createDebugPage();
+    void createDefaultPathsPage();
+    void createGraveyard();
+    void fillComboLists();
+    void placeTabControl();
+
     void Form_Load();
     void Form_Unload();
+    void Form_Resize();
+    void vbalDTabControl1_TabClick(int index);
+    void vbalDTabControl1_TabSelected(int index);
+    void vbalListDefPaths_ItemChanged(QTreeWidgetItem* item, int column);
+
+    QTreeWidgetItem* selectedRomRow() const;
+    void addRomRow(const QString& path, bool bEnabled);
+    // Sets every row's count from its folder with the current pattern.
+    void recountRomRows();
+    QString tabKey(int index) const;
 
     Platform& m_platform;
+    cLogo m_logo;
+    FileLister FileROM;
+    QButtonGroup* m_groupPaddleM1 = nullptr;
+    QButtonGroup* m_groupPaddleM2 = nullptr;
     bool m_bUnloading = false;
 };

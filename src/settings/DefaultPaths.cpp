@@ -1,0 +1,92 @@
+#include "settings/DefaultPaths.h"
+
+#include "platform/SettingsStore.h"
+
+#include <QFileInfo>
+
+namespace {
+
+const QString kSettings = QStringLiteral("Settings");
+
+QString entryKey(int n, QLatin1String suffix) {
+    return QStringLiteral("ROM") + (n == 1 ? QString() : QString::number(n)) + suffix;
+}
+
+// "/z26": how a path that already names the emulator ends.
+QString z26Suffix() {
+    return QLatin1Char('/') + z26FileName();
+}
+
+QString withoutTrailingSeparators(QString path) {
+    while (path.size() > 1 && path.endsWith(QLatin1Char('/')))
+        path.chop(1);
+    return path;
+}
+
+} // namespace
+
+QString romPathKey(int n) {
+    return entryKey(n, QLatin1String("Path"));
+}
+
+QString romCheckedKey(int n) {
+    return entryKey(n, QLatin1String("Checked"));
+}
+
+std::vector<RomFolder> readRomFolders(const SettingsStore& store) {
+    std::vector<RomFolder> folders;
+    for (int n = 1;; ++n) {
+        QString path = store.GetSetting(kSettings, romPathKey(n));
+        if (path.isEmpty())
+            break;
+        folders.push_back({std::move(path), readBool(store, kSettings, romCheckedKey(n), false)});
+    }
+    return folders;
+}
+
+void writeRomFolders(SettingsStore& store, const std::vector<RomFolder>& folders) {
+    int n = 1;
+    for (const RomFolder& folder : folders) {
+        store.SaveSetting(kSettings, romPathKey(n), folder.path);
+        store.SaveSetting(kSettings, romCheckedKey(n), boolText(folder.enabled));
+        ++n;
+    }
+    store.SaveSetting(kSettings, romPathKey(n), QString());
+}
+
+std::vector<RomFolder> loadExistingRomFolders(SettingsStore& store) {
+    std::vector<RomFolder> folders = readRomFolders(store);
+    const auto vanished = std::erase_if(
+        folders, [](const RomFolder& folder) { return !QFileInfo(folder.path).isDir(); });
+    if (vanished > 0)
+        writeRomFolders(store, folders);
+    return folders;
+}
+
+bool isArchiveName(const QString& item) {
+    return item.size() > 4 && item.endsWith(QLatin1String(".rar"), Qt::CaseInsensitive);
+}
+
+QString z26FileName() {
+#ifdef Q_OS_WIN
+    return QStringLiteral("z26.exe");
+#else
+    return QStringLiteral("z26");
+#endif
+}
+
+QString completeZ26Path(const QString& path) {
+    // A folder is completed even when its own name is the emulator's, as ~/z26/z26 is a
+    // common layout on this platform.
+    if (path.endsWith(z26Suffix(), Qt::CaseInsensitive) && !QFileInfo(path).isDir())
+        return path;
+    const QString folder = withoutTrailingSeparators(path);
+    return folder.endsWith(QLatin1Char('/')) ? folder + z26FileName() : folder + z26Suffix();
+}
+
+QString z26PathForDisplay(const QString& stored) {
+    const QString text = stored.trimmed();
+    if (text.size() < z26Suffix().size())
+        return text;
+    return completeZ26Path(text);
+}
