@@ -389,10 +389,11 @@ void frmSettings::createDebugPage() {
     auto* dos = tight(new QGridLayout(fraDOSOutput), 2);
     dos->setHorizontalSpacing(8);
     dos->addWidget(chkDOSSwitch, 0, 0);
-    // The preview label and the edit box take turns in the same place.
+    // The preview label and the edit box take turns in the same place, so the frame
+    // keeps its height in both modes.
     dos->addWidget(lblDOSOutput, 0, 1);
     dos->addWidget(txtDOSOutput, 0, 1);
-    dos->addWidget(lblDOSSwitchInstruction, 1, 1, Qt::AlignRight);
+    dos->addWidget(lblDOSSwitchInstruction, 0, 2);
     dos->setColumnStretch(1, 1);
     page->addWidget(fraDOSOutput);
     page->addStretch(1);
