@@ -7,7 +7,6 @@
 
 #include <array>
 #include <cerrno>
-#include <cstring>
 #include <memory>
 
 #include <fcntl.h>
