@@ -44,6 +44,11 @@ public:
     // The side strip's logo (its caption follows the selected tab).
     const cLogo& Logo() const { return m_logo; }
 
+    // Brings every option control that depends on another (enabled states, the preview of
+    // the emulator's switches) in line with the current values. Cheap; safe to call from
+    // any change handler.
+    void RefreshOptionStates();
+
     // Default Paths page.
     void LoadDefaultPaths();
     void SaveDefaultPaths();

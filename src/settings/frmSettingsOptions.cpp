@@ -1,0 +1,3 @@
+#include "settings/frmSettings.h"
+
+void frmSettings::RefreshOptionStates() {}
