@@ -1,5 +1,6 @@
 #include "app/frmMain.h"
 
+#include "about/frmAbout.h"
 #include "app/MenuIcons.h"
 #include "library/CCRC32.h"
 #include "library/GameDatabase.h"
@@ -14,12 +15,15 @@
 #include "settings/frmSettings.h"
 #include "ui/ListView.h"
 #include "ui/OleColor.h"
+#include "ui/PictureFile.h"
 #include "ui/Twips.h"
 #include "ui/cTextBoxXP.h"
 #include "ui/vbalProgressBar.h"
 
 #include <QApplication>
 #include <QCloseEvent>
+#include <QDir>
+#include <QFileInfo>
 #include <QGroupBox>
 #include <QHeaderView>
 #include <QKeyEvent>
@@ -79,6 +83,8 @@ void frmMain::createControls() {
     picBack = new QLabel(central);
     picBack->setObjectName(QStringLiteral("picBack"));
     picBack->hide();
+    m_backdrop = loadPictureFile(m_platform.programFolder + QStringLiteral("/backdrop.png"));
+    picBack->setPixmap(QPixmap::fromImage(m_backdrop));
 
     m_settings = std::make_unique<frmSettings>(m_platform);
 }
@@ -134,12 +140,18 @@ void frmMain::createMenus() {
             &frmMain::mnuSettingsConfiguration_Click);
     connect(mnuMainRefresh, &QAction::triggered, this, &frmMain::mnuMainRefresh_Click);
     connect(mnuMainGameInfo, &QAction::triggered, this, &frmMain::mnuMainGameInfo_Click);
+    connect(mnuBackColorChange, &QAction::triggered, this, &frmMain::mnuBackColorChange_Click);
+    connect(mnuTextColor, &QAction::triggered, this, &frmMain::mnuTextColor_Click);
+    connect(mnuBackImgChange, &QAction::triggered, this, &frmMain::mnuBackImgChange_Click);
+    connect(mnuBackImgEnabled, &QAction::triggered, this, &frmMain::mnuBackImgEnabled_Click);
+    connect(mnuAboutz26Readme, &QAction::triggered, this, &frmMain::mnuAboutz26Readme_Click);
+    connect(mnuAboutCopying, &QAction::triggered, this, &frmMain::mnuAboutCopying_Click);
+    connect(mnuAboutz26HomePage, &QAction::triggered, this, &frmMain::mnuAboutz26HomePage_Click);
+    connect(mnuAboutlumHomePage, &QAction::triggered, this, &frmMain::mnuAboutlumHomePage_Click);
+    connect(mnuAboutlumAbout, &QAction::triggered, this, &frmMain::mnuAboutlumAbout_Click);
 
     // Commands whose work is not part of the program yet stay visible but disabled.
-    for (QAction* pending :
-         {mnuFileLoadSettings, mnuFileSaveSettings, mnuTextColor, mnuBackImgChange,
-          mnuBackColorChange, mnuBackImgEnabled, mnuAboutz26Readme, mnuAboutCopying,
-          mnuAboutz26HomePage, mnuAboutlumAbout, mnuAboutlumHomePage})
+    for (QAction* pending : {mnuFileLoadSettings, mnuFileSaveSettings})
         pending->setEnabled(false);
 }
 
@@ -192,19 +204,13 @@ void frmMain::Form_Load() {
     vbalProgressBar1->setForeColor(0);
     vbalProgressBar1->setBarColor(vbalListViewCtl1->BackColor());
     vbalProgressBar1->setBarForeColor(vbalListViewCtl1->ForeColor());
+    ApplyBackground();
 
     const QString romPath = store.GetSetting(kSettings, QStringLiteral("ROMPath"));
     m_sZ26Path = store.GetSetting(kSettings, QStringLiteral("Z26Path"));
 
     if (!m_sZ26Path.isEmpty() && !romPath.isEmpty()) {
-        const int listWidth = vbalListViewCtl1->width();
-        m_listModel->addColumn(
-            {QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
-        m_listModel->addColumn(
-            {QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
-        QHeaderView* header = vbalListViewCtl1->header();
-        header->resizeSection(0, listWidth + twips::toPixelsX(1000));
-        header->resizeSection(1, twips::toPixelsX(1000));
+        addListColumns();
 
         show();
         QCoreApplication::processEvents();
@@ -226,8 +232,23 @@ void frmMain::Form_Load() {
     m_settings->show();
 }
 
+void frmMain::addListColumns() {
+    const int listWidth = vbalListViewCtl1->width();
+    m_listModel->addColumn(
+        {QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
+    m_listModel->addColumn(
+        {QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
+    QHeaderView* header = vbalListViewCtl1->header();
+    header->resizeSection(0, listWidth + twips::toPixelsX(1000));
+    header->resizeSection(1, twips::toPixelsX(1000));
+}
+
 void frmMain::RefreshMainList() {
     SettingsStore& store = m_platform.store;
+    // A list first filled after the paths were chosen on a first run still needs its
+    // columns, or its rows would not show until the next start.
+    if (m_listModel->columnCount() == 0)
+        addListColumns();
     File1.setPattern(m_settings->txtDefPathFilter->text());
     const QString search = txtSearch->text().trimmed();
 
@@ -469,4 +490,127 @@ qint16 frmMain::LookupSoftwareID(const QString& path) {
 
 QString frmMain::selectedRowPath() const {
     return m_listModel->rowPath(vbalListViewCtl1->selectedRow());
+}
+
+void frmMain::mnuBackColorChange_Click() {
+    const std::optional<quint32> chosen = m_platform.dialogs.ShowColor(
+        this, QStringLiteral("Choose a Color"), vbalListViewCtl1->BackColor());
+    if (!chosen)
+        return;
+    const quint32 colour = *chosen & 0xFFFFFF;
+    SettingsStore& store = m_platform.store;
+    store.SaveSetting(kSettings, QStringLiteral("BackColor"), QString::number(colour));
+    vbalListViewCtl1->setBackColor(colour);
+    const quint32 text = 16777215 - colour;
+    store.SaveSetting(kSettings, QStringLiteral("TextColor"), QString::number(text));
+    vbalListViewCtl1->setForeColor(text);
+    mnuBackImgEnabled->setChecked(false);
+    vbalListViewCtl1->setPicture(QString());
+    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"), boolText(false));
+    ApplyBackground();
+}
+
+void frmMain::mnuTextColor_Click() {
+    const std::optional<quint32> chosen = m_platform.dialogs.ShowColor(
+        this, QStringLiteral("Choose a Color"), vbalListViewCtl1->ForeColor());
+    if (!chosen)
+        return;
+    const quint32 colour = *chosen & 0xFFFFFF;
+    m_platform.store.SaveSetting(kSettings, QStringLiteral("TextColor"), QString::number(colour));
+    vbalListViewCtl1->setForeColor(colour);
+    ApplyBackground();
+}
+
+void frmMain::mnuBackImgChange_Click() {
+    FileDialogRequest request;
+    request.title = QStringLiteral("Choose Image File");
+    request.flags = kFlagPathMustExist | kFlagFileMustExist;
+    request.initialFolder = m_platform.programFolder + QStringLiteral("/Backgrounds");
+    request.filter = QStringLiteral("Image Files (*.jpg,*.bmp,*gif,*png)|*.jpg;*.bmp;*.gif;*.png|"
+                                    "All Files (*.*)|*.*");
+    request.filterIndex = 1;
+    SettingsStore& store = m_platform.store;
+    const QString chosen = m_platform.dialogs.ShowOpen(this, request);
+    if (!chosen.isEmpty())
+        store.SaveSetting(kSettings, QStringLiteral("BackImg"), chosen);
+    // Chosen or cancelled, the picture is switched on with the stored file.
+    mnuBackImgEnabled->setChecked(true);
+    vbalListViewCtl1->setPicture(store.GetSetting(kSettings, QStringLiteral("BackImg")));
+    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"), boolText(true));
+    ApplyBackground();
+}
+
+void frmMain::mnuBackImgEnabled_Click() {
+    // The action has already flipped its check mark when it is triggered from the menu.
+    SettingsStore& store = m_platform.store;
+    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked()
+                                     ? store.GetSetting(kSettings, QStringLiteral("BackImg"))
+                                     : QString());
+    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"),
+                      boolText(mnuBackImgEnabled->isChecked()));
+    ApplyBackground();
+}
+
+std::vector<vbalProgressBar*> frmMain::progressBars() const {
+    return {vbalProgressBar1};
+}
+
+void frmMain::ApplyBackground() {
+    QImage picture;
+    QImage barPicture;
+    if (mnuBackImgEnabled->isChecked()) {
+        picture = m_backdrop;
+        barPicture =
+            loadPictureFile(m_platform.store.GetSetting(kSettings, QStringLiteral("BackImg")));
+    }
+    for (vbalProgressBar* bar : progressBars()) {
+        bar->setPicture(picture);
+        bar->setBarPicture(barPicture);
+        bar->setBarForeColor(vbalListViewCtl1->ForeColor());
+        bar->setBarColor(vbalListViewCtl1->BackColor());
+    }
+}
+
+void frmMain::showEmulatorDocument(const QString& fileName) {
+    m_sZ26Path = m_platform.store.GetSetting(kSettings, QStringLiteral("Z26Path"));
+    QString folder = m_sZ26Path;
+    // A stored path of the emulator itself names its folder's documents; a folder that
+    // merely has the emulator's name is kept.
+    const QString suffix = u'/' + QStringLiteral("z26");
+    if (folder.endsWith(suffix, Qt::CaseInsensitive) && !QFileInfo(folder).isDir())
+        folder.chop(suffix.size());
+    QString path = folder + u'/' + fileName;
+    if (!folder.isEmpty() && !QFileInfo(path).isFile()) {
+        // Documents unpacked on Linux often carry lower-case names.
+        for (const QString& name : QDir(folder).entryList(QDir::Files))
+            if (name.compare(fileName, Qt::CaseInsensitive) == 0)
+                path = folder + u'/' + name;
+    }
+    if (folder.isEmpty() || !QFileInfo(path).isFile() || !m_platform.shell.OpenTextFile(path))
+        m_platform.dialogs.MsgBox(this, QStringLiteral("Error loading ") + fileName, MsgButtons::Ok,
+                                  MsgIcon::Exclamation, QStringLiteral("Error"));
+}
+
+void frmMain::mnuAboutz26Readme_Click() {
+    showEmulatorDocument(QStringLiteral("README.TXT"));
+}
+
+void frmMain::mnuAboutCopying_Click() {
+    showEmulatorDocument(QStringLiteral("COPYING.TXT"));
+}
+
+void frmMain::mnuAboutz26HomePage_Click() {
+    m_platform.shell.OpenUrl(QString(web::kZ26HomePage));
+}
+
+void frmMain::mnuAboutlumHomePage_Click() {
+    m_platform.shell.OpenUrl(QString(web::kLumHomePage));
+}
+
+void frmMain::mnuAboutlumAbout_Click() {
+    auto* about = new frmAbout(m_platform, this);
+    // The update check may start an installer and end the program at once, without any
+    // window saving its state.
+    connect(about, &frmAbout::endProgramRequested, qApp, [] { QCoreApplication::exit(0); });
+    about->show();
 }

@@ -2,9 +2,11 @@
 
 #include "library/FileLister.h"
 
+#include <QImage>
 #include <QMainWindow>
 
 #include <memory>
+#include <vector>
 
 struct Platform;
 class frmSettings;
@@ -83,6 +85,7 @@ protected:
 private:
     void createControls();
     void createMenus();
+    void addListColumns();
     void assignMenuIcons();
     void Form_Resize();
     void Form_Unload();
@@ -90,6 +93,21 @@ private:
     void mnuSettingsConfiguration_Click();
     void mnuMainRefresh_Click();
     void mnuMainGameInfo_Click();
+    void mnuBackColorChange_Click();
+    void mnuTextColor_Click();
+    void mnuBackImgChange_Click();
+    void mnuBackImgEnabled_Click();
+    void ApplyBackground();
+    // The bars that follow the list's colours and picture: the refresh's progress bar and
+    // the settings window's slider bars.
+    std::vector<vbalProgressBar*> progressBars() const;
+    void mnuAboutz26Readme_Click();
+    void mnuAboutCopying_Click();
+    void mnuAboutz26HomePage_Click();
+    void mnuAboutlumHomePage_Click();
+    void mnuAboutlumAbout_Click();
+    // Opens one of the emulator's documents in the text editor, or says it could not.
+    void showEmulatorDocument(const QString& fileName);
     // The software ID of a ROM file in the game database beside the program, or 0.
     qint16 LookupSoftwareID(const QString& path);
     // The selected row's full path, or the empty text when no row is selected.
@@ -98,5 +116,6 @@ private:
     Platform& m_platform;
     std::unique_ptr<frmSettings> m_settings;
     std::unique_ptr<CCRC32> mcrc32;
+    QImage m_backdrop; // picBack's built-in picture
     RomListModel* m_listModel = nullptr;
 };

@@ -1,9 +1,9 @@
 #include "ui/ListView.h"
 
 #include "ui/OleColor.h"
+#include "ui/PictureFile.h"
 
 #include <QHeaderView>
-#include <QImageReader>
 #include <QKeyEvent>
 #include <QMouseEvent>
 
@@ -33,14 +33,7 @@ void ListView::setForeColor(quint32 ole) {
 
 void ListView::setPicture(const QString& file) {
     m_pictureFile = file;
-    m_picture = QPixmap();
-    if (!file.isEmpty()) {
-        QImageReader reader(file);
-        // A background is a picture of modest size; a huge or broken file shows none.
-        const QSize size = reader.size();
-        if (size.isValid() && size.width() <= 8192 && size.height() <= 8192)
-            m_picture = QPixmap::fromImageReader(&reader);
-    }
+    m_picture = QPixmap::fromImage(loadPictureFile(file));
     applyPalette();
 }
 

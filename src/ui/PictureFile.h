@@ -1,0 +1,8 @@
+#pragma once
+
+#include <QImage>
+#include <QString>
+
+// The picture in an image file, or a null image when the name is empty or the file is
+// missing, unreadable, not a picture or unreasonably large.
+QImage loadPictureFile(const QString& file);
