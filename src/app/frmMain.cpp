@@ -268,7 +268,7 @@ void frmMain::RefreshMainList() {
             continue;
         File1.setPath(path);
         total += File1.ListCount();
-        listings.push_back({path, File1.names()});
+        listings.push_back({path, File1.takeNames()});
     }
 
     if (m_bInitialLoad) {

@@ -11,31 +11,40 @@
 
 namespace {
 
-// Wildcard match of a case-folded pattern against a case-folded name.
-bool wildcardMatch(QStringView pattern, QStringView name) {
-    qsizetype p = 0, n = 0;
-    qsizetype starP = -1, starN = 0;
+// Wildcard match of a case-folded pattern against a case-folded name, over QStringView
+// or std::string_view alike.
+template <typename View> bool wildcardMatch(View pattern, View name) {
+    using Size = decltype(pattern.size());
+    Size p = 0, n = 0;
+    Size starP = 0, starN = 0;
+    bool star = false;
     while (n < name.size()) {
-        if (p < pattern.size() && (pattern[p] == u'?' || pattern[p] == name[n])) {
+        if (p < pattern.size() && (pattern[p] == '?' || pattern[p] == name[n])) {
             ++p;
             ++n;
-        } else if (p < pattern.size() && pattern[p] == u'*') {
+        } else if (p < pattern.size() && pattern[p] == '*') {
+            star = true;
             starP = p++;
             starN = n;
-        } else if (starP >= 0) {
+        } else if (star) {
             p = starP + 1;
             n = ++starN;
         } else {
             return false;
         }
     }
-    while (p < pattern.size() && pattern[p] == u'*')
+    while (p < pattern.size() && pattern[p] == '*')
         ++p;
     return p == pattern.size();
 }
 
 bool isAscii(QStringView s) {
     return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
+}
+
+bool isAscii(std::string_view s) {
+    return std::all_of(s.begin(), s.end(),
+                       [](char c) { return static_cast<unsigned char>(c) < 0x80; });
 }
 
 QString foldCase(QStringView s) {
@@ -53,14 +62,24 @@ FilePattern::FilePattern(const QString& pattern) : m_text(pattern) {
             continue;
         m_wildcards.push_back(w == QLatin1String("*.*") ? QStringLiteral("*") : foldCase(w));
     }
+    m_asciiOnly = std::all_of(m_wildcards.begin(), m_wildcards.end(),
+                              [](const QString& w) { return isAscii(QStringView(w)); });
+    if (m_asciiOnly)
+        for (const QString& w : m_wildcards)
+            m_asciiWildcards.push_back(w.toStdString());
 }
 
 bool FilePattern::matches(QStringView name) const {
-    if (m_wildcards.empty())
-        return false;
     const QString folded = foldCase(name);
-    return std::any_of(m_wildcards.begin(), m_wildcards.end(),
-                       [&](const QString& w) { return wildcardMatch(w, folded); });
+    return std::any_of(m_wildcards.begin(), m_wildcards.end(), [&](const QString& w) {
+        return wildcardMatch(QStringView(w), QStringView(folded));
+    });
+}
+
+bool FilePattern::matchesFoldedAscii(std::string_view foldedName) const {
+    return std::any_of(m_asciiWildcards.begin(), m_asciiWildcards.end(), [&](const std::string& w) {
+        return wildcardMatch(std::string_view(w), foldedName);
+    });
 }
 
 QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
@@ -72,7 +91,16 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
     if (!dir)
         return names;
     const int dirFd = dirfd(dir.get());
-    std::vector<QString> keys;
+
+    // Names and their sort keys are gathered as bytes in two buffers; only the names that
+    // match become QStrings, once, after sorting. Keys are the case-folded names in UTF-8,
+    // which for plain ASCII names is just their lower-case bytes.
+    struct Entry {
+        size_t name, nameSize, key, keySize;
+    };
+    std::string rawNames;
+    std::string keys;
+    std::vector<Entry> entries;
     while (const dirent* entry = readdir(dir.get())) {
         if (entry->d_name[0] == '.')
             continue;
@@ -83,26 +111,48 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
         }
         if (!regular)
             continue;
-        QString name = QFile::decodeName(entry->d_name);
-        QString key = foldCase(name);
-        if (!std::any_of(pattern.wildcardsBegin(), pattern.wildcardsEnd(),
-                         [&](const QString& w) { return wildcardMatch(w, key); }))
+        const std::string_view raw(entry->d_name);
+        const size_t keyStart = keys.size();
+        bool match = false;
+        if (pattern.asciiOnly() && isAscii(raw)) {
+            keys.resize(keyStart + raw.size());
+            std::transform(
+                raw.begin(), raw.end(), keys.begin() + static_cast<std::ptrdiff_t>(keyStart),
+                [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; });
+            match = pattern.matchesFoldedAscii(std::string_view(keys).substr(keyStart));
+        } else {
+            const QString name =
+                QFile::decodeName(QByteArray(raw.data(), static_cast<qsizetype>(raw.size())));
+            match = pattern.matches(name);
+            if (match)
+                keys += foldCase(name).toStdString();
+        }
+        if (!match) {
+            keys.resize(keyStart);
             continue;
-        names.push_back(std::move(name));
-        keys.push_back(std::move(key));
+        }
+        entries.push_back({rawNames.size(), raw.size(), keyStart, keys.size() - keyStart});
+        rawNames += raw;
     }
-    // Sort by the case-folded name; equal keys keep a stable, case-sensitive order.
-    std::vector<int> order(names.size());
-    std::iota(order.begin(), order.end(), 0);
-    std::sort(order.begin(), order.end(), [&](int a, int b) {
-        const int c = QStringView(keys[a]).compare(QStringView(keys[b]));
-        return c != 0 ? c < 0 : names[a] < names[b];
+
+    const std::string_view allNames(rawNames);
+    const std::string_view allKeys(keys);
+    // Sort by the folded name; equal keys keep a stable, case-sensitive order.
+    std::sort(entries.begin(), entries.end(), [&](const Entry& a, const Entry& b) {
+        const int c = allKeys.substr(a.key, a.keySize).compare(allKeys.substr(b.key, b.keySize));
+        if (c != 0)
+            return c < 0;
+        return allNames.substr(a.name, a.nameSize) < allNames.substr(b.name, b.nameSize);
     });
-    QStringList sorted;
-    sorted.reserve(names.size());
-    for (int i : order)
-        sorted.push_back(std::move(names[i]));
-    return sorted;
+    names.reserve(static_cast<qsizetype>(entries.size()));
+    for (const Entry& e : entries) {
+        const char* data = rawNames.data() + e.name;
+        const auto size = static_cast<qsizetype>(e.nameSize);
+        names.push_back(isAscii(allNames.substr(e.name, e.nameSize))
+                            ? QString::fromLatin1(data, size)
+                            : QFile::decodeName(QByteArray(data, size)));
+    }
+    return names;
 }
 
 void FileLister::setPattern(const QString& pattern) {

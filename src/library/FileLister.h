@@ -3,6 +3,8 @@
 #include <QString>
 #include <QStringList>
 
+#include <string>
+#include <string_view>
 #include <vector>
 
 // A file-name pattern: wildcards ('*', '?') separated by ';', matched against a whole
@@ -11,13 +13,17 @@ class FilePattern {
 public:
     explicit FilePattern(const QString& pattern = QStringLiteral("*.*"));
     bool matches(QStringView name) const;
+    // Whether every wildcard is plain ASCII, so that ASCII names can be matched as bytes.
+    bool asciiOnly() const { return m_asciiOnly; }
+    // The match for an ASCII name already in lower case.
+    bool matchesFoldedAscii(std::string_view foldedName) const;
     const QString& text() const { return m_text; }
-    auto wildcardsBegin() const { return m_wildcards.begin(); }
-    auto wildcardsEnd() const { return m_wildcards.end(); }
 
 private:
     QString m_text;
     std::vector<QString> m_wildcards; // case-folded
+    std::vector<std::string> m_asciiWildcards;
+    bool m_asciiOnly = true;
 };
 
 // Lists one folder at a time: the regular, non-hidden files whose names match the
