@@ -1,0 +1,89 @@
+#include "emulator/LeadingNumber.h"
+#include "emulator/OptionFile.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+TEST(LeadingNumber, TakesTheLongestDecimalPrefixAfterBlanks) {
+    const struct {
+        const char* text;
+        double value;
+    } cases[] = {
+        {"12abc", 12},   {"abc", 0},   {"", 0},       {"   42", 42}, {"\t 7 fps", 7},
+        {"-3.5x", -3.5}, {"+8", 8},    {".5", 0.5},   {"5.", 5},     {"1.2.3", 1.2},
+        {"12e", 12},     {"12e+", 12}, {"1e3", 1000}, {"2E-1", 0.2}, {"-", 0},
+        {".", 0},        {"-.", 0},    {"- 5", 0},    {"1 2", 1},    {"0x10", 0},
+        {"1e-999", 0},   {"007", 7},   {"60,5", 60},  {"inf", 0},    {"nan", 0},
+    };
+    for (const auto& c : cases)
+        EXPECT_DOUBLE_EQ(leadingNumber(QString::fromLatin1(c.text)), c.value) << c.text;
+    EXPECT_TRUE(std::isinf(leadingNumber(u"1e999")));
+}
+
+TEST(LeadingNumber, SinglesStayFiniteSoEveryTextCanBeSaved) {
+    EXPECT_EQ(leadingSingle(u"1e999"), std::numeric_limits<float>::max());
+    EXPECT_EQ(leadingSingle(u"-1e39"), std::numeric_limits<float>::lowest());
+    EXPECT_EQ(leadingSingle(u"12abc"), 12.0f);
+    EXPECT_EQ(leadingSingle(u"abc"), 0.0f);
+}
+
+TEST(LeadingNumber, WholeNumberMustBeNothingButANumber) {
+    const struct {
+        const char* text;
+        std::optional<double> value;
+    } cases[] = {
+        {"46", 46},           {" 46 ", 46},          {"12.", 12},           {"0.", 0},
+        {"-1.5", -1.5},       {"1e+", std::nullopt}, {"-", std::nullopt},   {"", std::nullopt},
+        {"4a", std::nullopt}, {"a", std::nullopt},   {"1 2", std::nullopt},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(wholeDecimalNumber(QString::fromLatin1(c.text)), c.value) << c.text;
+}
+
+TEST(ShortestDecimalText, WritesTheShortestTextThatReadsBack) {
+    const struct {
+        float value;
+        const char* text;
+    } cases[] = {
+        {0.0f, "0"},
+        {-0.0f, "0"},
+        {1.5f, "1.5"},
+        {12.0f, "12"},
+        {4608.0f, "4608"},
+        {0.1f, "0.1"},
+        {1.1f, "1.1"},
+        {-2.5f, "-2.5"},
+        {1e7f, "10000000"},
+        {0.001f, "0.001"},
+        {1e20f, "1e+20"},
+        {1e-6f, "1e-06"},
+        {std::numeric_limits<float>::quiet_NaN(), "0"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(shortestDecimalText(c.value), QLatin1String(c.text)) << c.value;
+
+    // What a load writes into a text field, a later save reads back unchanged.
+    for (float v : {1.0f / 3, 123456.789f, -7.25e-3f, std::numeric_limits<float>::max(),
+                    std::numeric_limits<float>::lowest(), std::numeric_limits<float>::denorm_min(),
+                    16777217.0f})
+        EXPECT_EQ(leadingSingle(shortestDecimalText(v)), v) << v;
+}
+
+TEST(LumExtension, AppendedUnlessTheLastFourCharactersAreDotLum) {
+    const struct {
+        const char* path;
+        const char* saved;
+    } cases[] = {
+        {"name", "name.lum"},
+        {"/tmp/NAME.LUM", "/tmp/NAME.LUM"},
+        {"x.lum.bak", "x.lum.bak.lum"},
+        {"a.txt", "a.txt.lum"},
+        {"/opt/a.Lum", "/opt/a.Lum"},
+        {"lum", "lum.lum"},
+        {"/sets/my lum", "/sets/my lum.lum"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(withLumExtension(QString::fromLatin1(c.path)), QLatin1String(c.saved)) << c.path;
+}
