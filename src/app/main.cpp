@@ -7,10 +7,13 @@
 #include "platform/Registry.h"
 
 #include <QApplication>
+#include <QIcon>
 
 int main(int argc, char** argv) {
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("lum"));
+    QApplication::setWindowIcon(QIcon(QStringLiteral(":/lum.png")));
+    QGuiApplication::setDesktopFileName(QStringLiteral("lum"));
 
     IniSettingsStore store(IniSettingsStore::defaultFilePath());
     QtDialogs dialogs;
