@@ -1,0 +1,36 @@
+#include "settings/PictureFit.h"
+
+#include <cmath>
+
+std::optional<PictureFit> FitPictureToBox(QSizeF picture, float height, float width,
+                                          bool subtractFrame, float top, float left) {
+    const float pictureHeight = static_cast<float>(picture.height());
+    const float pictureWidth = static_cast<float>(picture.width());
+    if (!(pictureHeight > 0) || !(pictureWidth > 0) || !std::isfinite(pictureHeight) ||
+        !std::isfinite(pictureWidth))
+        return std::nullopt;
+
+    float h = height;
+    float w = width;
+    if (subtractFrame) {
+        h -= kPreviewFrameHeight;
+        w -= kPreviewFrameWidth;
+    }
+    PictureFit fit{top, left, 0, 0};
+    // A window smaller than its frame leaves no room to show anything.
+    if (!(h > 0) || !(w > 0))
+        return fit;
+
+    const float rp = pictureHeight / pictureWidth;
+    const float rb = h / w;
+    if (rp <= rb) {
+        fit.width = w;
+        fit.height = fit.width * rp;
+        fit.top = top + h / 2 - fit.height / 2;
+    } else {
+        fit.height = h;
+        fit.width = fit.height / rp;
+        fit.left = left + w / 2 - fit.width / 2;
+    }
+    return fit;
+}
