@@ -156,6 +156,18 @@ void frmMain::createMenus() {
 }
 
 void frmMain::assignMenuIcons() {
+    // The icons are made when a menu first opens: nothing of them is needed for the
+    // window's first paint.
+    for (QMenu* menu : {mnuFile, mnuSettings, mnuAbout}) {
+        connect(menu, &QMenu::aboutToShow, this, [this] {
+            if (!m_menuIconsAssigned)
+                assignMenuIconsNow();
+        });
+    }
+}
+
+void frmMain::assignMenuIconsNow() {
+    m_menuIconsAssigned = true;
     const std::pair<QAction*, int> icons[] = {
         {mnuFileExit, 3},          {mnuFileLoadSettings, 9},
         {mnuFileSaveSettings, 10}, {mnuSettingsConfiguration, 0},

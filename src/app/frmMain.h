@@ -87,6 +87,7 @@ private:
     void createMenus();
     void addListColumns();
     void assignMenuIcons();
+    void assignMenuIconsNow();
     void Form_Resize();
     void Form_Unload();
     void mnuFileExit_Click();
@@ -117,5 +118,6 @@ private:
     std::unique_ptr<frmSettings> m_settings;
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
+    bool m_menuIconsAssigned = false;
     RomListModel* m_listModel = nullptr;
 };

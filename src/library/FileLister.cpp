@@ -3,6 +3,7 @@
 #include <QFile>
 
 #include <algorithm>
+#include <cstdint>
 #include <memory>
 #include <numeric>
 
@@ -96,6 +97,7 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
     // match become QStrings, once, after sorting. Keys are the case-folded names in UTF-8,
     // which for plain ASCII names is just their lower-case bytes.
     struct Entry {
+        std::uint64_t prefix; // the key's first eight bytes, big-endian: most comparisons end here
         size_t name, nameSize, key, keySize;
     };
     std::string rawNames;
@@ -131,7 +133,12 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
             keys.resize(keyStart);
             continue;
         }
-        entries.push_back({rawNames.size(), raw.size(), keyStart, keys.size() - keyStart});
+        std::uint64_t prefix = 0;
+        for (size_t i = 0; i < 8; ++i)
+            prefix =
+                (prefix << 8) |
+                (keyStart + i < keys.size() ? static_cast<unsigned char>(keys[keyStart + i]) : 0u);
+        entries.push_back({prefix, rawNames.size(), raw.size(), keyStart, keys.size() - keyStart});
         rawNames += raw;
     }
 
@@ -139,6 +146,8 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
     const std::string_view allKeys(keys);
     // Sort by the folded name; equal keys keep a stable, case-sensitive order.
     std::sort(entries.begin(), entries.end(), [&](const Entry& a, const Entry& b) {
+        if (a.prefix != b.prefix)
+            return a.prefix < b.prefix;
         const int c = allKeys.substr(a.key, a.keySize).compare(allKeys.substr(b.key, b.keySize));
         if (c != 0)
             return c < 0;

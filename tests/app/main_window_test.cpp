@@ -9,6 +9,7 @@
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMenu>
 #include <QMenuBar>
 #include <QTabWidget>
 
@@ -178,6 +179,9 @@ TEST(MainWindowMenus, CaptionsAndAccessKeys) {
         ASSERT_NE(action, nullptr) << name;
         EXPECT_EQ(action->text(), caption) << name;
     }
+    EXPECT_TRUE(w.mnuFileExit->icon().isNull()); // made when a menu first opens
+    emit w.mnuFile->aboutToShow();
     EXPECT_FALSE(w.mnuFileExit->icon().isNull());
+    EXPECT_FALSE(w.mnuAboutlumHomePage->icon().isNull());
     EXPECT_TRUE(w.mnuBackImgEnabled->isCheckable());
 }

@@ -1,0 +1,214 @@
+// Start-up: from process start to the first paint of the main window with its list filled,
+// for 10,000 and 100,000 ROMs, against a minimal Qt program that shows a window and quits
+// at its first paint; and the peak memory of each. Every run is a fresh process (this
+// program started again in a child mode), timed and measured by the parent.
+
+#include "BenchReport.h"
+
+#include "app/frmMain.h"
+#include "library/RomListModel.h"
+#include "platform/Downloader.h"
+#include "platform/IniSettingsStore.h"
+#include "platform/Platform.h"
+#include "platform/QtDialogs.h"
+#include "platform/QtShell.h"
+#include "platform/Registry.h"
+
+#include <QApplication>
+#include <QDir>
+#include <QEvent>
+#include <QFile>
+#include <QWidget>
+
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <string>
+
+#include <dirent.h>
+#include <fcntl.h>
+#include <fnmatch.h>
+#include <spawn.h>
+#include <strings.h>
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+extern char** environ;
+
+namespace {
+
+// Ends the process at the first paint of the watched window.
+class FirstPaint : public QObject {
+public:
+    bool eventFilter(QObject*, QEvent* event) override {
+        if (event->type() == QEvent::Paint) {
+            std::fflush(stdout);
+            _exit(0);
+        }
+        return false;
+    }
+};
+
+int runMinimal(int argc, char** argv) {
+    QApplication app(argc, argv);
+    QWidget window;
+    FirstPaint watcher;
+    window.installEventFilter(&watcher);
+    window.resize(327, 438);
+    window.show();
+    return QApplication::exec();
+}
+
+int runLum(int argc, char** argv, const char* configFile) {
+    const auto t0 = std::chrono::steady_clock::now();
+    const bool phases = std::getenv("LUM_BENCH_PHASES") != nullptr;
+    auto phase = [&](const char* what) {
+        if (phases)
+            std::fprintf(
+                stderr, "%-12s %7.1f ms\n", what,
+                std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - t0)
+                    .count());
+    };
+    QApplication app(argc, argv);
+    phase("app");
+    IniSettingsStore store(QString::fromLocal8Bit(configFile));
+    QtDialogs dialogs;
+    QtShell shell;
+    QtDownloader network;
+    ToolRegistry registry;
+    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network, registry};
+    frmMain window(platform);
+    phase("windows");
+    FirstPaint watcher;
+    // The load handler shows the window and lets one paint through before it fills the
+    // list; the paint that counts is the first one after the fill.
+    window.Form_Load();
+    phase("load");
+    window.installEventFilter(&watcher);
+    window.show();
+    window.update();
+    return QApplication::exec();
+}
+
+void makeFolder(const std::string& folder, int count) {
+    const std::string done = folder + "/.complete";
+    if (access(done.c_str(), F_OK) == 0)
+        return;
+    QDir().mkpath(QString::fromStdString(folder));
+    for (int i = 0; i < count; ++i) {
+        const std::string name = folder + "/Game " + std::to_string(i) + ".bin";
+        close(open(name.c_str(), O_CREAT | O_WRONLY, 0644));
+    }
+    close(open(done.c_str(), O_CREAT | O_WRONLY, 0644));
+}
+
+std::string writeConfig(const std::string& root, const std::string& folder, int count) {
+    const std::string path = root + "/startup-" + std::to_string(count) + ".ini";
+    FILE* f = std::fopen(path.c_str(), "w");
+    std::fprintf(f, "[Settings]\nZ26Path=%s\nROMPath=%s\nROMChecked=True\nROMFilter=*.bin\n",
+                 root.c_str(), folder.c_str());
+    std::fclose(f);
+    return path;
+}
+
+struct Run {
+    double ms;
+    long maxRssKb;
+};
+
+Run spawnChild(const char* self, std::initializer_list<const char*> args) {
+    std::vector<char*> argv{const_cast<char*>(self)};
+    for (const char* a : args)
+        argv.push_back(const_cast<char*>(a));
+    argv.push_back(nullptr);
+    const auto start = std::chrono::steady_clock::now();
+    pid_t pid = 0;
+    if (posix_spawn(&pid, self, nullptr, nullptr, argv.data(), environ) != 0) {
+        std::perror("posix_spawn");
+        std::exit(1);
+    }
+    int status = 0;
+    rusage usage{};
+    wait4(pid, &status, 0, &usage);
+    const auto end = std::chrono::steady_clock::now();
+    return {std::chrono::duration<double, std::milli>(end - start).count(), usage.ru_maxrss};
+}
+
+size_t readdirBaseline(const std::string& folder) {
+    std::vector<std::string> names;
+    DIR* dir = opendir(folder.c_str());
+    while (const dirent* e = readdir(dir))
+        if (e->d_name[0] != '.' && e->d_type == DT_REG &&
+            fnmatch("*.bin", e->d_name, FNM_CASEFOLD) == 0)
+            names.emplace_back(e->d_name);
+    closedir(dir);
+    std::sort(names.begin(), names.end(), [](const std::string& a, const std::string& b) {
+        return strcasecmp(a.c_str(), b.c_str()) < 0;
+    });
+    return names.size();
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    if (argc >= 2 && std::strcmp(argv[1], "--minimal") == 0)
+        return runMinimal(argc, argv);
+    if (argc >= 3 && std::strcmp(argv[1], "--lum") == 0)
+        return runLum(argc, argv, argv[2]);
+
+    setenv("QT_QPA_PLATFORM", "offscreen", 1);
+    const std::string root = "/tmp/lum-bench-startup";
+    const std::string self = "/proc/self/exe";
+    char exe[4096] = {};
+    const ssize_t n = readlink(self.c_str(), exe, sizeof exe - 1);
+    if (n <= 0)
+        return 1;
+
+    constexpr int kRuns = 7;
+    auto repeat = [&](std::initializer_list<const char*> args, bench::Samples& time,
+                      std::vector<long>& rss) {
+        spawnChild(exe, args); // warm the caches
+        for (int i = 0; i < kRuns; ++i) {
+            const Run r = spawnChild(exe, args);
+            time.ms.push_back(r.ms);
+            rss.push_back(r.maxRssKb);
+        }
+    };
+    bench::Samples floor;
+    std::vector<long> floorRss;
+    repeat({"--minimal"}, floor, floorRss);
+
+    for (int count : {10000, 100000}) {
+        const std::string folder = root + "/roms-" + std::to_string(count);
+        makeFolder(folder, count);
+        const std::string config = writeConfig(root, folder, count);
+        bench::Samples ours;
+        std::vector<long> rss;
+        repeat({"--lum", config.c_str()}, ours, rss);
+        const std::string name = "start-up, " + std::to_string(count) + " ROMs";
+        if (count == 10000) {
+            bench::report(name, ours, "minimal Qt", floor, 1.5);
+        } else {
+            const bench::Samples base = bench::measure(kRuns, [&] { readdirBaseline(folder); });
+            bench::Samples limit;
+            for (size_t i = 0; i < floor.ms.size(); ++i)
+                limit.ms.push_back(1.5 * floor.ms[i] + base.median());
+            const double aimRatio = limit.median() / floor.median();
+            bench::Samples scaledOurs = ours;
+            bench::report(name, scaledOurs, "minimal Qt", floor, aimRatio);
+            std::printf("   (aim: under 1.5 x floor + readdir %.1f ms = %.1f ms)\n", base.median(),
+                        limit.median());
+            std::sort(rss.begin(), rss.end());
+            std::sort(floorRss.begin(), floorRss.end());
+            const double above = (rss[rss.size() / 2] - floorRss[floorRss.size() / 2]) / 1024.0;
+            std::printf("%-34s ours %9.1f MB | minimal Qt %9.1f MB | %.1f MB above | aim < 40 MB "
+                        "above %s\n",
+                        "peak memory, 100,000 rows", rss[rss.size() / 2] / 1024.0,
+                        floorRss[floorRss.size() / 2] / 1024.0, above,
+                        above < 40 ? "met" : "MISSED");
+        }
+    }
+    return 0;
+}
