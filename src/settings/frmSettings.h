@@ -2,6 +2,7 @@
 
 #include "library/FileLister.h"
 #include "ui/cLogo.h"
+#include "ui/vbalProgressBar.h"
 
 #include <QWidget>
 
@@ -48,6 +49,27 @@ public:
     // the emulator's switches) in line with the current values. Cheap; safe to call from
     // any change handler.
     void RefreshOptionStates();
+
+    // Slider bars. Every handler ends in RefreshOptionStates.
+    void BarColorPaddle_Change();
+    void BarColorPhos_Change();
+    // Back to the default, 77.
+    void BarColorPhos_DblClick();
+    void BarColorSoundQueue_Change();
+    // Back to the default window 4500..4700 and value 4608.
+    void BarColorSoundQueue_DblClick();
+    // '+' and '-' shift the scale by 100.
+    void BarColorSoundQueue_KeyPress(int KeyAscii);
+    // Pops up mnuSQPopup at the mouse.
+    void BarColorSoundQueue_RightClick();
+    void mnuSQShiftUp_Click();
+    void mnuSQShiftDown_Click();
+    void mnuSQReset_Click();
+    QMenu* mnuSQPopup = nullptr;
+    QAction* mnuSQShiftUp = nullptr;
+    QAction* mnuSQShiftDown = nullptr;
+    QAction* mnuSQBar = nullptr;
+    QAction* mnuSQReset = nullptr;
 
     // Default Paths page.
     void LoadDefaultPaths();
@@ -106,7 +128,7 @@ public:
     QPushButton* cmdLeftControlPic = nullptr;
     QPushButton* cmdRightControlPic = nullptr;
     QGroupBox* fraPaddleSens = nullptr;
-    QWidget* BarColorPaddle = nullptr;
+    vbalProgressBar* BarColorPaddle = nullptr;
     QGroupBox* fraInactiveControll = nullptr;
     QCheckBox* chkIPCStella = nullptr;
     QCheckBox* chkIPCJoystick = nullptr;
@@ -132,7 +154,7 @@ public:
     QLineEdit* txtLowerSens = nullptr;
     QLabel* lblLowerSensScan = nullptr;
     QGroupBox* fraSoundQueue = nullptr;
-    QWidget* BarColorSoundQueue = nullptr;
+    vbalProgressBar* BarColorSoundQueue = nullptr;
     QGroupBox* fraPaddleMouse = nullptr;
     // "Paddle 0" to "Paddle 3" of each mouse, plus each one's "None".
     std::array<QRadioButton*, 4> optPaddleM1{};
@@ -156,7 +178,7 @@ public:
     QRadioButton* optNarrow1 = nullptr;
     QRadioButton* optNarrow2 = nullptr;
     QGroupBox* fraPhos = nullptr;
-    QWidget* BarColorPhos = nullptr;
+    vbalProgressBar* BarColorPhos = nullptr;
     QGroupBox* fraColorPalette = nullptr;
     QRadioButton* optCPNTSC = nullptr;
     QRadioButton* optCPPAL = nullptr;
@@ -234,6 +256,10 @@ private:
     void createDebugPage();
     void createDefaultPathsPage();
     void createGraveyard();
+    // Each slider bar with its range, start value, text and handlers.
+    vbalProgressBar* createBarColorPaddle();
+    vbalProgressBar* createBarColorPhos();
+    vbalProgressBar* createBarColorSoundQueue();
     void fillComboLists();
     void placeTabControl();
 

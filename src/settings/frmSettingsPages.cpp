@@ -10,7 +10,6 @@
 #include <QButtonGroup>
 #include <QCheckBox>
 #include <QComboBox>
-#include <QFrame>
 #include <QGridLayout>
 #include <QGroupBox>
 #include <QHBoxLayout>
@@ -51,15 +50,6 @@ QLineEdit* numberField(const char* name, const char* text) {
     auto* field = named(new QLineEdit(QString::fromUtf8(text)), name);
     field->setFixedWidth(twips::toPixelsX(750));
     return field;
-}
-
-// Stands in for a slider bar until the bar control takes its place.
-QWidget* sliderPlaceholder(const char* name) {
-    auto* bar = named(new QFrame, name);
-    bar->setFrameShape(QFrame::StyledPanel);
-    bar->setFrameShadow(QFrame::Sunken);
-    bar->setMinimumHeight(twips::toPixelsY(300));
-    return bar;
 }
 
 // A balloon tip's anchor: a text box that is never shown, only pointed at.
@@ -195,7 +185,7 @@ void frmSettings::createControlsPage() {
     page->addWidget(fraInactiveControll);
 
     fraPaddleSens = frame("fraPaddleSens", "Keyboard Paddle Sensitivity");
-    BarColorPaddle = sliderPlaceholder("BarColorPaddle");
+    BarColorPaddle = createBarColorPaddle();
     tight(new QVBoxLayout(fraPaddleSens))->addWidget(BarColorPaddle);
 
     // Shown only while a port holds a light gun.
@@ -244,8 +234,7 @@ void frmSettings::createPaddlesAudioPage() {
     page->addWidget(fraLowerSens);
 
     fraSoundQueue = frame("fraSoundQueue", "Size of Sound Queue");
-    BarColorSoundQueue = sliderPlaceholder("BarColorSoundQueue");
-    BarColorSoundQueue->setToolTip(QStringLiteral("Double click to reset value to the default"));
+    BarColorSoundQueue = createBarColorSoundQueue();
     tight(new QVBoxLayout(fraSoundQueue))->addWidget(BarColorSoundQueue);
     page->addWidget(fraSoundQueue);
 
@@ -325,7 +314,7 @@ void frmSettings::createVideoPage() {
         ->addLayout(row({optCPNTSC, optCPPAL, optCPSECAM, optCPDefault}));
 
     fraPhos = frame("fraPhos", "Phosphorescent Effect");
-    BarColorPhos = sliderPlaceholder("BarColorPhos");
+    BarColorPhos = createBarColorPhos();
     tight(new QVBoxLayout(fraPhos))->addWidget(BarColorPhos);
 
     auto* palettePhos = new QHBoxLayout;

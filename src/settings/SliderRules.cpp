@@ -1,0 +1,83 @@
+#include "settings/SliderRules.h"
+
+#include <algorithm>
+
+namespace sliders {
+
+namespace {
+
+// A shifted value lands this far inside the window's near edge.
+constexpr qint64 kLandingInset = 5;
+// The lowest window is a full 200 wide; the highest only 197, ending at the scale's top.
+constexpr qint64 kLowestWindowMax = 201;
+constexpr qint64 kHighestWindowMin = 65339;
+
+} // namespace
+
+Scale SoundQueueDefault() {
+    return {kSoundQueueDefaultMin, kSoundQueueDefaultMax, kSoundQueueDefault};
+}
+
+Scale ShiftSoundQueue(const Scale& scale, int keyAscii) {
+    // Wide arithmetic: the bounds may come from anywhere (a loaded file), and stepping past
+    // the ends of int must not overflow.
+    qint64 lo = scale.min;
+    qint64 hi = scale.max;
+    qint64 value = scale.value;
+    const bool up = keyAscii == kKeyShiftUp;
+    const bool down = keyAscii == kKeyShiftDown;
+    if (up) {
+        lo += kSoundQueueStep;
+        hi += kSoundQueueStep;
+    } else if (down) {
+        lo -= kSoundQueueStep;
+        hi -= kSoundQueueStep;
+    }
+
+    // Hold the window inside the scale before looking at the value, so that a shift which
+    // cannot move the window cannot move the value either.
+    if (hi > kSoundQueueHighest) {
+        hi = kSoundQueueHighest;
+        lo = kHighestWindowMin;
+    }
+    if (lo < kSoundQueueLowest) {
+        lo = kSoundQueueLowest;
+        hi = kLowestWindowMax;
+    }
+
+    if (down && value > hi)
+        value = hi - kLandingInset;
+    if (up && value < lo)
+        value = lo + kLandingInset;
+    value = std::clamp<qint64>(value, kSoundQueueLowest, kSoundQueueHighest);
+
+    return {static_cast<int>(lo), static_cast<int>(hi), static_cast<int>(value)};
+}
+
+QString FormatThousands(qint64 value, const QString& separator) {
+    // The magnitude as unsigned, so that the lowest qint64 has one too.
+    const bool negative = value < 0;
+    const quint64 magnitude =
+        negative ? 0 - static_cast<quint64>(value) : static_cast<quint64>(value);
+    const QString digits = QString::number(magnitude);
+    QString text;
+    text.reserve(digits.size() + (digits.size() / 3) * separator.size() + 1);
+    if (negative)
+        text += QLatin1Char('-');
+    for (qsizetype i = 0; i < digits.size(); ++i) {
+        if (i > 0 && (digits.size() - i) % 3 == 0)
+            text += separator;
+        text += digits.at(i);
+    }
+    return text;
+}
+
+QString SoundQueueText(int value, const QLocale& locale) {
+    return FormatThousands(value, locale.groupSeparator());
+}
+
+QString PlainText(int value) {
+    return QString::number(value);
+}
+
+} // namespace sliders
