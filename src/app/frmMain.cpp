@@ -213,9 +213,11 @@ void frmMain::Form_Load() {
                                      : QString());
     vbalListViewCtl1->setForeColor(readColour(store, kSettings, QStringLiteral("TextColor"), 0));
 
-    vbalProgressBar1->setForeColor(0);
-    vbalProgressBar1->setBarColor(vbalListViewCtl1->BackColor());
-    vbalProgressBar1->setBarForeColor(vbalListViewCtl1->ForeColor());
+    for (vbalProgressBar* bar : progressBars()) {
+        bar->setForeColor(0);
+        bar->setBarColor(vbalListViewCtl1->BackColor());
+        bar->setBarForeColor(vbalListViewCtl1->ForeColor());
+    }
     ApplyBackground();
 
     const QString romPath = store.GetSetting(kSettings, QStringLiteral("ROMPath"));
@@ -564,7 +566,8 @@ void frmMain::mnuBackImgEnabled_Click() {
 }
 
 std::vector<vbalProgressBar*> frmMain::progressBars() const {
-    return {vbalProgressBar1};
+    return {vbalProgressBar1, m_settings->BarColorPaddle, m_settings->BarColorSoundQueue,
+            m_settings->BarColorPhos};
 }
 
 void frmMain::ApplyBackground() {

@@ -33,8 +33,12 @@ TEST(Appearance, BackgroundColourInvertsTheTextAndSwitchesThePictureOff) {
         w.mnuBackColorChange->trigger();
         EXPECT_EQ(w.vbalListViewCtl1->BackColor(), c.background);
         EXPECT_EQ(w.vbalListViewCtl1->ForeColor(), c.text);
-        EXPECT_EQ(w.vbalProgressBar1->BarColor(), c.background);
-        EXPECT_EQ(w.vbalProgressBar1->BarForeColor(), c.text);
+        for (vbalProgressBar* bar :
+             {w.vbalProgressBar1, w.settingsWindow().BarColorPaddle,
+              w.settingsWindow().BarColorSoundQueue, w.settingsWindow().BarColorPhos}) {
+            EXPECT_EQ(bar->BarColor(), c.background) << bar->objectName().toStdString();
+            EXPECT_EQ(bar->BarForeColor(), c.text) << bar->objectName().toStdString();
+        }
         EXPECT_FALSE(w.mnuBackImgEnabled->isChecked());
         EXPECT_FALSE(w.vbalListViewCtl1->hasPicture());
         EXPECT_TRUE(w.vbalProgressBar1->BarPicture().isNull());
@@ -85,6 +89,7 @@ TEST(Appearance, PictureOffAndOnRestoresTheStoredPicture) {
     EXPECT_EQ(w.vbalListViewCtl1->Picture(), picture);
     EXPECT_TRUE(w.vbalListViewCtl1->hasPicture());
     EXPECT_EQ(w.vbalProgressBar1->BarPicture().pixelColor(0, 0), QColor(Qt::green));
+    EXPECT_EQ(w.settingsWindow().BarColorPhos->BarPicture().pixelColor(0, 0), QColor(Qt::green));
     EXPECT_EQ(app.fake.reopenStore()->GetSetting("Settings", "BackImgEnabled"), "True");
 
     // A start with the picture switched off shows none.
@@ -141,5 +146,7 @@ TEST(Appearance, StoredColoursApplyAtStart) {
     EXPECT_EQ(w.vbalProgressBar1->BarColor(), 8421504u);
     EXPECT_EQ(w.vbalProgressBar1->BarForeColor(), 65535u);
     EXPECT_EQ(w.vbalProgressBar1->ForeColor(), 0u);
+    EXPECT_EQ(w.settingsWindow().BarColorPaddle->BarColor(), 8421504u);
+    EXPECT_EQ(w.settingsWindow().BarColorPaddle->ForeColor(), 0u);
     EXPECT_EQ(w.vbalListViewCtl1->palette().color(QPalette::Text), QColor(255, 255, 0));
 }
