@@ -51,6 +51,7 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
     setWindowTitle(QStringLiteral("lum"));
     createControls();
     createMenus();
+    m_settings->setLoadRomHandler([this](bool ForceLoad) { LoadROM(ForceLoad); });
 }
 
 frmMain::~frmMain() = default;
@@ -79,6 +80,7 @@ void frmMain::createControls() {
     txtSearch->installEventFilter(this);
     connect(vbalListViewCtl1, &ListView::keyDown, this, &frmMain::vbalListViewCtl1_KeyDown);
     connect(vbalListViewCtl1, &ListView::mouseDown, this, &frmMain::vbalListViewCtl1_MouseDown);
+    connect(vbalListViewCtl1, &ListView::itemDoubleClicked, this, [this] { LoadROM(false); });
 
     picBack = new QLabel(central);
     picBack->setObjectName(QStringLiteral("picBack"));
@@ -476,6 +478,8 @@ void frmMain::txtSearch_DblClick() {
 void frmMain::vbalListViewCtl1_KeyDown(int key) {
     if (key == Qt::Key_F5)
         RefreshMainList();
+    else if (key == Qt::Key_Return || key == Qt::Key_Enter)
+        LoadROM(false);
 }
 
 void frmMain::vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos) {

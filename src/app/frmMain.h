@@ -34,6 +34,12 @@ public:
     // Rebuilds the ROM list from the enabled folders, the file pattern and the search box.
     void RefreshMainList();
 
+    // Starts the emulator on the selected ROM with the settings window's switches, after
+    // checking the paths and the options that would spoil the game. With "Edit Switches"
+    // on it hands the switches to the user instead, unless ForceLoad: then it starts with
+    // the switches as the user edited them.
+    void LoadROM(bool ForceLoad = false);
+
     frmSettings& settingsWindow() { return *m_settings; }
     RomListModel& listModel() { return *m_listModel; }
 

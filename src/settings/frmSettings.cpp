@@ -123,6 +123,7 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
             &frmSettings::vbalListDefPaths_ItemChanged);
 
     Form_Load();
+    connectOptionControls();
 }
 
 frmSettings::~frmSettings() = default;
@@ -247,6 +248,8 @@ void frmSettings::Form_Resize() {
 }
 
 bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
+    if (optionControlEvent(watched, event))
+        return true;
     const bool bFolderList = watched == vbalListDefPaths->viewport();
     const bool bZ26Box = watched == txtDefPathz26;
     if (bFolderList || bZ26Box) {

@@ -7,6 +7,7 @@
 #include <QWidget>
 
 #include <array>
+#include <functional>
 
 struct Platform;
 class PictureBox;
@@ -49,6 +50,58 @@ public:
     // the emulator's switches) in line with the current values. Cheap; safe to call from
     // any change handler.
     void RefreshOptionStates();
+
+    // Whether the device named by one letter ("k" keyboard, "m" mouse, "j" joystick, "s"
+    // Stelladaptor) can drive the controller selected on the left (bLeft) or right port.
+    bool CheckIPC(bool bLeft, const QString& device) const;
+    // The switch builders: each reads its controls as they are now and returns an empty
+    // text or switches that start with a blank (" -c1"). Some tidy the number fields they
+    // read and the controller ones caption the layout-picture buttons, every time.
+    QString LeftController();
+    QString RightController();
+    QString Interlaced();
+    QString P0Hard();
+    QString P1Hard();
+    QString All4();
+    QString StartBW();
+    QString ScreenCapture();
+    QString ColorPalette();
+    QString DSP();
+    QString Narrow();
+    QString Phos();
+    QString GameType();
+    QString ScanLines();
+    QString IPC();
+    QString MindlinkLeft();
+    QString MindlinkRight();
+    QString Joystick();
+    QString PaddleSens();
+    QString LowerSens();
+    QString Paddle();
+    QString MouseCapture();
+    QString LightGun();
+    QString ShowScanline();
+    QString PALColorLoss();
+    QString Quiet();
+    QString SoundQueue();
+    QString FPS();
+    QString CodeTrace();
+    QString LineScan();
+    QString VideoMode();
+    QString DrivCont();
+    QString SwapControl();
+    QString KeyCont();
+    QString PrintChecksum();
+    QString FastCopy();
+    QString SyncWSound();
+
+    // The switches a launch sends: the launch's builders concatenated in their fixed
+    // order, with the leading blank of the first.
+    QString LaunchSwitches();
+
+    // Called with ForceLoad true when Enter is pressed in the edited switches; the main
+    // window starts the emulator from it.
+    void setLoadRomHandler(std::function<void(bool)> handler);
 
     // Slider bars. Every handler ends in RefreshOptionStates.
     void BarColorPaddle_Change();
@@ -276,10 +329,27 @@ private:
     void recountRomRows();
     QString tabKey(int index) const;
 
+    // Option behaviour: the controls' reactions, the numeric fields' filter and the
+    // switch-edit mode.
+    void connectOptionControls();
+    bool optionControlEvent(QObject* watched, QEvent* event);
+    void numberCheck_Click(QCheckBox* box, QLineEdit* field);
+    void optFPS_Click();
+    void comboVideoMode_Click();
+    void chkDOSSwitch_Click();
+    void txtDOSOutput_KeyPress();
+    // Gives a number field the decimal text of its leading number.
+    QString normaliseField(QLineEdit* field);
+
     Platform& m_platform;
     cLogo m_logo;
     FileLister FileROM;
     QButtonGroup* m_groupPaddleM1 = nullptr;
     QButtonGroup* m_groupPaddleM2 = nullptr;
     bool m_bUnloading = false;
+    std::function<void(bool)> m_loadRom;
+    // A refresh asked for while one runs (a field it tidies reports the change) is run
+    // once more after it instead of inside it.
+    bool m_bRefreshing = false;
+    bool m_bRefreshAgain = false;
 };
