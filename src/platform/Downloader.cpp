@@ -19,7 +19,9 @@ bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename
         return false;
 
     QSaveFile target(LocalFilename);
-    if (!target.open(QIODevice::WriteOnly))
+    // Unbuffered, so that a short write (a full disk) shows at once: commit() flushes a
+    // buffered one without noticing the failure and would put a cut-off file in place.
+    if (!target.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
         return false;
 
     if (!m_manager)

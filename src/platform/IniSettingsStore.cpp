@@ -3,15 +3,27 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QHash>
 #include <QSaveFile>
 #include <QStandardPaths>
 
 #include <algorithm>
+#include <optional>
 
 namespace {
 
 bool sameName(const QString& a, const QString& b) {
     return a.compare(b, Qt::CaseInsensitive) == 0;
+}
+
+// A name folded code point by code point, as the comparison above folds it: two names are
+// the same exactly when their keys are equal. Lets a big file be read in linear time.
+QString nameKey(QStringView name) {
+    QString key;
+    key.reserve(name.size());
+    for (const char32_t c : name.toUcs4())
+        key += QChar::fromUcs4(QChar::toCaseFolded(c));
+    return key;
 }
 
 // Values may hold any text; line breaks and backslashes are escaped so that one line
@@ -70,7 +82,10 @@ QString IniSettingsStore::defaultFilePath() {
 
 std::vector<IniSettingsStore::Section> IniSettingsStore::parse(const QByteArray& text) {
     std::vector<Section> sections;
-    Section* current = nullptr;
+    // Where each section and key already read lies, by name key.
+    QHash<QString, std::size_t> sectionAt;
+    std::vector<QHash<QString, std::size_t>> entryAt;
+    std::optional<std::size_t> current;
     const QString all = QString::fromUtf8(text);
     for (QStringView line : QStringView(all).split(u'\n')) {
         if (line.endsWith(u'\r'))
@@ -80,29 +95,33 @@ std::vector<IniSettingsStore::Section> IniSettingsStore::parse(const QByteArray&
             continue;
         if (trimmed.startsWith(u'[') && trimmed.endsWith(u']')) {
             const QString name = trimmed.mid(1, trimmed.size() - 2).trimmed().toString();
-            auto it = std::find_if(sections.begin(), sections.end(),
-                                   [&](const Section& s) { return sameName(s.name, name); });
-            if (it == sections.end()) {
+            const QString k = nameKey(name);
+            auto at = sectionAt.constFind(k);
+            if (at == sectionAt.constEnd()) {
+                at = sectionAt.insert(k, sections.size());
                 sections.push_back({name, {}});
-                current = &sections.back();
-            } else {
-                current = &*it;
+                entryAt.emplace_back();
             }
+            current = *at;
             continue;
         }
         const qsizetype eq = line.indexOf(u'=');
-        if (current == nullptr || eq <= 0)
+        if (!current || eq <= 0)
             continue;
         const QString key = line.left(eq).trimmed().toString();
         if (key.isEmpty())
             continue;
-        const QString value = unescape(line.mid(eq + 1).toString());
-        auto it = std::find_if(current->entries.begin(), current->entries.end(),
-                               [&](const Entry& e) { return sameName(e.key, key); });
-        if (it == current->entries.end())
-            current->entries.push_back({key, value});
-        else
-            it->value = value; // the last of two spellings wins, as on a rewrite
+        QString value = unescape(line.mid(eq + 1).toString());
+        std::vector<Entry>& entries = sections[*current].entries;
+        QHash<QString, std::size_t>& index = entryAt[*current];
+        const QString k = nameKey(key);
+        // The last of two spellings wins, as on a rewrite.
+        if (const auto at = index.constFind(k); at != index.constEnd()) {
+            entries[*at].value = std::move(value);
+        } else {
+            index.insert(k, entries.size());
+            entries.push_back({key, std::move(value)});
+        }
     }
     return sections;
 }
@@ -173,8 +192,14 @@ bool IniSettingsStore::DeleteSetting(const QString& section, const QString& key)
 bool IniSettingsStore::write() const {
     QDir().mkpath(QFileInfo(m_filePath).absolutePath());
     QSaveFile file(m_filePath);
-    if (!file.open(QIODevice::WriteOnly))
+    // Unbuffered, so that a short write (a full disk) shows here: commit() flushes a
+    // buffered one without noticing the failure and would put a cut-off file in place.
+    if (!file.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
         return false;
-    file.write(format(m_sections));
+    const QByteArray text = format(m_sections);
+    if (file.write(text) != text.size()) {
+        file.cancelWriting();
+        return false;
+    }
     return file.commit();
 }

@@ -1,7 +1,8 @@
 #pragma once
 
 // Window geometry is stored in twips (1440 per inch). These convert with the primary
-// screen's logical DPI, so that a stored value keeps its meaning on any screen.
+// screen's logical DPI, so that a stored value keeps its meaning on any screen. Pixel
+// results stay within twice the desktop's extent, whatever the store held.
 namespace twips {
 
 double perPixelX();

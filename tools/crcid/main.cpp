@@ -34,8 +34,9 @@ int main(int argc, char** argv) {
     // Written beside the target and renamed into place, so a failure leaves no half file.
     QSaveFile database(databasePath);
     const QByteArray bytes = encodeGameDatabase(parsed.records);
-    if (!database.open(QIODevice::WriteOnly) || database.write(bytes) != bytes.size() ||
-        !database.commit()) {
+    // Unbuffered: a buffered short write would only fail inside commit(), unnoticed.
+    if (!database.open(QIODevice::WriteOnly | QIODevice::Unbuffered) ||
+        database.write(bytes) != bytes.size() || !database.commit()) {
         std::fprintf(stderr, "%s: error: cannot write the database: %s\n", argv[2],
                      qPrintable(database.errorString()));
         return 1;

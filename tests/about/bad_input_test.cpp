@@ -1,0 +1,168 @@
+#include "LocalHttpServer.h"
+#include "support/FakePlatform.h"
+
+#include "about/UpdateCheck.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QRandomGenerator>
+
+#include <csignal>
+
+#include <sys/resource.h>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+const QString kDescription = QStringLiteral("/programs/update.txt");
+const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
+
+class BadUpdateInput : public ::testing::Test {
+protected:
+    FakePlatform fake;
+    LocalHttpServer server;
+
+    // Runs an update check and returns the title and text of the one box it shows.
+    std::pair<QString, QString> check(bool forum = false) {
+        fake.dialogs.boxes.clear();
+        UpdateCheck(fake.platform, nullptr, server.base()).Run(forum);
+        if (fake.dialogs.boxes.size() != 1)
+            return {QStringLiteral("%1 boxes").arg(fake.dialogs.boxes.size()), QString()};
+        return {fake.dialogs.boxes[0].title, fake.dialogs.boxes[0].text};
+    }
+    // A section offering a newer version, with the installer served.
+    QByteArray newerSection(const QByteArray& fileName) const {
+        return kHeader + "https://example.org/forum\r\n1049613\r\nsoon\r\n" +
+               server.base().toUtf8() + "/setup.run\r\n" + fileName + "\r\n0\r\n";
+    }
+};
+
+// Writes fail as on a full disk while this lives: files cannot grow past `bytes`.
+class DiskFull {
+public:
+    explicit DiskFull(rlim_t bytes) {
+        getrlimit(RLIMIT_FSIZE, &m_saved);
+        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN);
+        rlimit limit = m_saved;
+        limit.rlim_cur = bytes;
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~DiskFull() {
+        setrlimit(RLIMIT_FSIZE, &m_saved);
+        std::signal(SIGXFSZ, m_oldHandler);
+    }
+    DiskFull(const DiskFull&) = delete;
+    DiskFull& operator=(const DiskFull&) = delete;
+
+private:
+    rlimit m_saved{};
+    void (*m_oldHandler)(int);
+};
+
+QByteArray noise(qsizetype size, quint32 seed) {
+    QByteArray bytes(size, '\0');
+    QRandomGenerator random(seed);
+    for (char& c : bytes)
+        c = static_cast<char>(random.bounded(256));
+    return bytes;
+}
+
+} // namespace
+
+// Descriptions that hold nothing usable for this product: the check says there is no
+// update, and the forum button falls back to the general forum.
+TEST_F(BadUpdateInput, EmptyGarbageAndOversizedDescriptionsFindNoSection) {
+    const QByteArray cases[] = {
+        QByteArray(), noise(64 * 1024, 3), QByteArray(8 * 1024 * 1024, 'x'), // one line of 8 MiB
+        QByteArray("::lum (Windows Front End for z26)\0\r\n", 36),           // a NUL in the header
+    };
+    for (const QByteArray& body : cases) {
+        SCOPED_TRACE(body.left(40).toStdString());
+        server.serve(kDescription, body);
+        EXPECT_EQ(check(), std::make_pair(QStringLiteral("No updates available"),
+                                          QStringLiteral("No Updates Found")));
+        fake.shell.urls.clear();
+        check(true);
+        EXPECT_EQ(fake.shell.urls, QStringList{server.base() + "/forum"});
+    }
+}
+
+// A section after megabytes of other text is still found.
+TEST_F(BadUpdateInput, AnOversizedDescriptionIsReadToItsSection) {
+    QByteArray filler;
+    while (filler.size() < 8 * 1024 * 1024)
+        filler += "::Some other product\r\nhttps://example.org/other\r\n'" + noise(60, 5).toHex() +
+                  "\r\n";
+    server.serve(kDescription, filler + kHeader +
+                                   "https://example.org/forum\r\n1049612\r\n"
+                                   "today\r\nu\r\nn\r\n0\r\n");
+    EXPECT_EQ(check().first, "No update needed");
+}
+
+// Garbage inside the section: a version that is no number, or a section that stops short,
+// is a failed check; nothing is downloaded.
+TEST_F(BadUpdateInput, GarbageInTheSectionIsAFailedCheck) {
+    const QByteArray cases[] = {
+        kHeader + "https://example.org/forum\r\n" + noise(100, 9).replace('\n', ' ') + "\r\n",
+        kHeader + "https://example.org/forum\r\n99999999999999999999999\r\n",
+        kHeader + "https://example.org/forum\r\n-5\r\n",
+        kHeader,
+    };
+    for (const QByteArray& body : cases) {
+        server.serve(kDescription, body);
+        EXPECT_EQ(check().first, "Update Check Failed");
+    }
+    EXPECT_FALSE(QFileInfo::exists(fake.programFolder() + "/Update"));
+}
+
+// Folders in place of the files the check writes: the user is told the step failed, and
+// the folders are left as they were.
+TEST_F(BadUpdateInput, FoldersInPlaceOfTheFilesItWrites) {
+    const QString localCopy = fake.makeFolder("program/tmp");
+    fake.writeFile("program/tmp/keep.txt", "mine");
+    server.serve(kDescription, newerSection("setup.run"));
+    EXPECT_EQ(check(), std::make_pair(QStringLiteral("Update Check Failed"),
+                                      QStringLiteral("Failed to connect to the internet")));
+    EXPECT_TRUE(QFileInfo(localCopy).isDir());
+    QDir(localCopy).removeRecursively();
+
+    // The installer's name is taken by a folder.
+    server.serve("/setup.run", "INSTALLER");
+    fake.makeFolder("program/Update/setup.run");
+    fake.dialogs.answers = {MsgResult::Yes};
+    fake.dialogs.boxes.clear();
+    UpdateCheck(fake.platform, nullptr, server.base()).Run(false);
+    ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(fake.dialogs.boxes[1].title, "Download Failed");
+    EXPECT_TRUE(QFileInfo(fake.programFolder() + "/Update/setup.run").isDir());
+    QDir(fake.programFolder() + "/Update").removeRecursively();
+
+    // A file is where the Update folder belongs.
+    fake.writeFile("program/Update", "not a folder");
+    fake.dialogs.answers = {MsgResult::Yes};
+    fake.dialogs.boxes.clear();
+    UpdateCheck(fake.platform, nullptr, server.base()).Run(false);
+    ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(fake.dialogs.boxes[1].title, "Download Failed");
+    EXPECT_TRUE(QFileInfo(fake.programFolder() + "/Update").isFile());
+    EXPECT_TRUE(fake.shell.started.empty());
+}
+
+// A download that cannot be written whole (a full disk) fails, and neither a cut-off
+// installer nor a cut-off description is left where the program would use it.
+TEST_F(BadUpdateInput, ADownloadOnAFullDiskFailsAndLeavesNoCutOffFile) {
+    const QString target = fake.writeFile("program/Update/setup.run", "OLD INSTALLER");
+    // Small enough to be written in one piece when the download ends.
+    server.serve("/setup.run", noise(8 * 1024, 1));
+    {
+        const DiskFull full(1024);
+        EXPECT_FALSE(fake.network.DownloadFile(server.base() + "/setup.run", target));
+    }
+    QFile file(target);
+    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
+    EXPECT_EQ(file.readAll(), "OLD INSTALLER");
+    EXPECT_EQ(QDir(fake.programFolder() + "/Update").entryList(QDir::Files | QDir::Hidden),
+              QStringList{"setup.run"});
+}

@@ -1,0 +1,234 @@
+#include "AppFixture.h"
+
+#include "library/RomListModel.h"
+#include "platform/SettingsStore.h"
+#include "settings/frmSettings.h"
+#include "ui/ListView.h"
+#include "ui/Twips.h"
+#include "ui/vbalProgressBar.h"
+
+#include <QBuffer>
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QGuiApplication>
+#include <QImage>
+#include <QImageWriter>
+#include <QMenu>
+#include <QScreen>
+
+#include <csignal>
+#include <functional>
+
+#include <sys/resource.h>
+#include <unistd.h>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+const QString kSettings = QStringLiteral("Settings");
+
+// A file that exists but cannot be read. Root reads through any permission bits, so for
+// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
+// its start fails (EIO).
+QString makeUnreadable(const QString& path, const QByteArray& content) {
+    QFile::remove(path);
+    if (geteuid() == 0) {
+        QFile::link(QStringLiteral("/proc/self/mem"), path);
+    } else {
+        QFile file(path);
+        file.open(QIODevice::WriteOnly);
+        file.write(content);
+        file.close();
+        QFile::setPermissions(path, {});
+    }
+    return path;
+}
+
+QByteArray png(int width, int height) {
+    QImage image(width, height, QImage::Format_RGB32);
+    image.fill(Qt::darkCyan);
+    QByteArray bytes;
+    QBuffer buffer(&bytes);
+    buffer.open(QIODevice::WriteOnly);
+    image.save(&buffer, "PNG");
+    return bytes;
+}
+
+// A PNG header that claims a picture of the given size, with no picture data after it.
+QByteArray claimedPng(quint32 width, quint32 height) {
+    QByteArray header = png(1, 1).left(24);
+    for (int i = 0; i < 4; ++i) {
+        header[16 + i] = static_cast<char>((width >> (24 - 8 * i)) & 0xFF);
+        header[20 + i] = static_cast<char>((height >> (24 - 8 * i)) & 0xFF);
+    }
+    return header;
+}
+
+QByteArray contents(const QString& path) {
+    QFile file(path);
+    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<unreadable>");
+}
+
+// Writes fail as on a full disk while this lives: files cannot grow past `bytes`.
+class DiskFull {
+public:
+    explicit DiskFull(rlim_t bytes) {
+        getrlimit(RLIMIT_FSIZE, &m_saved);
+        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN);
+        rlimit limit = m_saved;
+        limit.rlim_cur = bytes;
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~DiskFull() {
+        setrlimit(RLIMIT_FSIZE, &m_saved);
+        std::signal(SIGXFSZ, m_oldHandler);
+    }
+    DiskFull(const DiskFull&) = delete;
+    DiskFull& operator=(const DiskFull&) = delete;
+
+private:
+    rlimit m_saved{};
+    void (*m_oldHandler)(int);
+};
+
+} // namespace
+
+// Placement values that convert but make no sense (a damaged or hand-edited store): the
+// window still opens at a size the user can work with, on the screen.
+TEST(BadInputMainWindow, AbsurdPlacementValuesStillGiveAUsableWindow) {
+    const struct {
+        const char *height, *width, *top, *left;
+    } cases[] = {
+        {"1e30", "1e30", "1e30", "1e30"}, {"-1e30", "-1e30", "-1e30", "-1e30"},
+        {"3e9", "3e9", "3e9", "3e9"},     {"0", "0", "-5000", "-5000"},
+        {"nan", "inf", "tall", ""},
+    };
+    const QSize screen = QGuiApplication::primaryScreen()->virtualSize();
+    const int desktop = std::max(screen.width(), screen.height());
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.height);
+        AppFixture app;
+        app.fake.store.SaveSetting("winpos", "height", c.height);
+        app.fake.store.SaveSetting("winpos", "width", c.width);
+        app.fake.store.SaveSetting("winpos", "top", c.top);
+        app.fake.store.SaveSetting("winpos", "left", c.left);
+        frmMain& w = app.load();
+        EXPECT_GE(w.width(), twips::toPixelsX(2700) - 1);
+        EXPECT_GE(w.height(), twips::toPixelsY(2700) - 1);
+        EXPECT_LE(w.width(), 2 * desktop);
+        EXPECT_LE(w.height(), 2 * desktop);
+        EXPECT_FALSE(w.grab().isNull()); // paints the whole window, as the screen would
+    }
+}
+
+// Background pictures in bad shapes: the list shows no picture, nothing is reported and
+// the stored name is kept for a later fix of the file.
+TEST(BadInputMainWindow, BadBackgroundPicturesShowNone) {
+    const struct {
+        const char* name;
+        std::function<QString(FakePlatform&)> make;
+    } cases[] = {
+        {"empty", [](FakePlatform& f) { return f.writeFile("empty.png"); }},
+        {"truncated", [](FakePlatform& f) { return f.writeFile("cut.png", png(64, 64).left(60)); }},
+        {"oversized",
+         [](FakePlatform& f) { return f.writeFile("huge.png", claimedPng(100000, 100000)); }},
+        {"absurd header",
+         [](FakePlatform& f) { return f.writeFile("bad.png", claimedPng(0xFFFFFFFF, 1)); }},
+        {"unreadable",
+         [](FakePlatform& f) { return makeUnreadable(f.root() + "/locked.png", png(4, 4)); }},
+        {"a folder", [](FakePlatform& f) { return f.makeFolder("folder.png"); }},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        AppFixture app;
+        const QString path = c.make(app.fake);
+        app.fake.store.SaveSetting(kSettings, "BackImg", path);
+        frmMain& w = app.load();
+        EXPECT_FALSE(w.vbalListViewCtl1->hasPicture());
+        EXPECT_TRUE(w.vbalProgressBar1->BarPicture().isNull());
+        EXPECT_EQ(app.fake.dialogs.boxes.size(), 1u); // only the first-run question
+        EXPECT_EQ(app.fake.reopenStore()->GetSetting(kSettings, "BackImg"), path);
+        w.grab();
+    }
+}
+
+// ROM folders that are not readable folders, and a flag that is no Boolean: the list is
+// empty, the caption says so, and no message interrupts the start.
+TEST(BadInputMainWindow, RomFoldersThatListNothing) {
+    AppFixture app;
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+    app.storeFolder(1, app.fake.writeFile("file.bin", "x"));
+    app.storeFolder(2, app.fake.root() + "/gone");
+    app.storeFolder(3, app.fake.makeFolder("empty"));
+    app.storeFolder(4, app.romFolder("roms", {"a.bin"}));
+    app.fake.store.SaveSetting(kSettings, "ROM4Checked", "maybe");
+    frmMain& w = app.load();
+    EXPECT_EQ(w.windowTitle(), "lum - 0 ROM's Found");
+    EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+}
+
+// CRCID.dat in place but not a readable file: a right-click shows only Refresh and says
+// nothing.
+TEST(BadInputMainWindow, ABrokenGameDatabaseIdentifiesNothing) {
+    for (const bool folder : {true, false}) {
+        AppFixture app;
+        const QString database = app.fake.programFolder() + "/CRCID.dat";
+        if (folder)
+            QDir().mkpath(database);
+        else
+            makeUnreadable(database, QByteArray(56, '\0'));
+        app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+        app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+        frmMain& w = app.load();
+        w.vbalListViewCtl1->setCurrentIndex(w.listModel().index(0, 0));
+        w.vbalListViewCtl1_MouseDown(Qt::RightButton, QPoint(10, 10));
+        EXPECT_FALSE(w.mnuMainGameInfo->isVisible());
+        EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+        w.mnuMainPopup->close();
+    }
+}
+
+// Nothing lost, nothing crashes: a settings folder that cannot be written (a file stands
+// where the folder belongs, as with a read-only or vanished location) lets the program
+// run and close normally; the settings of this session stay in memory until then.
+TEST(BadInputMainWindow, ClosesNormallyWhenTheSettingsFolderCannotBeWritten) {
+    FakePlatform fake;
+    const QString blocker = fake.writeFile("config-file", "not a folder");
+    IniSettingsStore store(blocker + "/lum/lum.ini");
+    store.SaveSetting(kSettings, "Z26Path", fake.root());
+    const QString roms = fake.makeFolder("roms");
+    fake.writeFile("roms/a.bin");
+    store.SaveSetting(kSettings, "ROMPath", roms);
+    store.SaveSetting(kSettings, "ROMChecked", "True");
+    Platform platform{store,        fake.dialogs, fake.shell, fake.programFolder(),
+                      fake.network, fake.registry};
+    {
+        frmMain w(platform);
+        w.Form_Load();
+        w.show();
+        EXPECT_EQ(w.windowTitle(), "lum - 1 ROM Found");
+        w.close();
+    }
+    EXPECT_EQ(contents(blocker), "not a folder");
+}
+
+// The same with a store file that exists but cannot grow (a full disk): the file on disk
+// is left whole, and no temporary file is left beside it.
+TEST(BadInputMainWindow, ClosingOnAFullDiskLeavesTheStoreFileWhole) {
+    AppFixture app;
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+    frmMain& w = app.load();
+    w.resize(w.width() + 40, w.height() + 40);
+    const QByteArray before = contents(app.fake.iniPath());
+    const QString folder = QFileInfo(app.fake.iniPath()).absolutePath();
+    {
+        const DiskFull full(0);
+        w.close();
+        app.window.reset();
+    }
+    EXPECT_EQ(contents(app.fake.iniPath()), before);
+    EXPECT_EQ(QDir(folder).entryList(QDir::Files | QDir::Hidden), QStringList{"lum.ini"});
+}
