@@ -92,3 +92,16 @@ TEST(BadInputOptionFile, AnOversizedFileIsReadForItsFirstRecordOnly) {
     ASSERT_TRUE(read.ok());
     EXPECT_EQ(read.record, record);
 }
+
+// A sound-queue value with a fraction gives a range that does not hold the value, which
+// the slider would refuse: the set is reported at that field instead of loading a value
+// the file never held.
+TEST(BadInputOptionFile, ASoundQueueWithAFractionIsRejectedAtItsField) {
+    for (const float stored : {3839.625f, 12.5f, 99.75f}) {
+        ConfigRecord record;
+        record.BarColorSoundQueue = stored;
+        const ConfigDecode read = decodeConfig(record.encode(), kLimits);
+        EXPECT_EQ(read.status, ConfigStatus::Invalid) << stored;
+        EXPECT_EQ(read.firstBad, ConfigField::BarColorSoundQueue) << stored;
+    }
+}
