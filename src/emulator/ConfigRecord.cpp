@@ -272,7 +272,9 @@ std::optional<SoundQueueScale> soundQueueScaleFor(float stored) {
     const std::optional<int> min = roundToInt((hundreds - 1) * 100);
     const std::optional<int> max = roundToInt((hundreds + 1) * 100);
     const std::optional<int> value = roundToInt(stored);
-    if (!min || !max || !value)
+    // A value with a fraction ("3839.625") has hundreds that do not frame it: the slider
+    // would refuse a value outside its range.
+    if (!min || !max || !value || *value < *min || *value > *max)
         return std::nullopt;
     return SoundQueueScale{*min, *max, *value};
 }

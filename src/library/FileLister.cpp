@@ -20,13 +20,14 @@ template <typename View> bool wildcardMatch(View pattern, View name) {
     Size starP = 0, starN = 0;
     bool star = false;
     while (n < name.size()) {
-        if (p < pattern.size() && (pattern[p] == '?' || pattern[p] == name[n])) {
-            ++p;
-            ++n;
-        } else if (p < pattern.size() && pattern[p] == '*') {
+        // A star is a wildcard even where the name holds a star of its own.
+        if (p < pattern.size() && pattern[p] == '*') {
             star = true;
             starP = p++;
             starN = n;
+        } else if (p < pattern.size() && (pattern[p] == '?' || pattern[p] == name[n])) {
+            ++p;
+            ++n;
         } else if (star) {
             p = starP + 1;
             n = ++starN;

@@ -124,6 +124,7 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
 
     Form_Load();
     connectOptionControls();
+    connectConfigControls();
 }
 
 frmSettings::~frmSettings() = default;

@@ -4,6 +4,7 @@
 #include "ui/cLogo.h"
 #include "ui/vbalProgressBar.h"
 
+#include <QPointer>
 #include <QWidget>
 
 #include <array>
@@ -25,6 +26,7 @@ class QRadioButton;
 class QTabWidget;
 class QTreeWidget;
 class QTreeWidgetItem;
+class frmPicPreview;
 
 // The settings window: created hidden by the main window's load and kept until the
 // program ends. Its close box only hides it; its option controls are the one holder of
@@ -102,6 +104,19 @@ public:
     // Called with ForceLoad true when Enter is pressed in the edited switches; the main
     // window starts the emulator from it.
     void setLoadRomHandler(std::function<void(bool)> handler);
+
+    // Option sets (.lum files). LoadSettings writes the file's options into the controls
+    // and returns false, after saying so, when the file is corrupt; the two buttons (also
+    // the main window's File menu) ask for a file and report in lblConfig.
+    bool LoadSettings(const QString& path);
+    void cmdSaveDat_Click();
+    void cmdLoadDat_Click();
+
+    // The layout picture's file name for a button caption ("/lum Paddles.jpg" for one that
+    // mentions "paddle"), or "" when the caption names no layout.
+    QString GetPicName(const QString& cmdTxt) const;
+    void cmdLeftControlPic_Click();
+    void cmdRightControlPic_Click();
 
     // Slider bars. Every handler ends in RefreshOptionStates.
     void BarColorPaddle_Change();
@@ -341,6 +356,11 @@ private:
     // Gives a number field the decimal text of its leading number.
     QString normaliseField(QLineEdit* field);
 
+    // Option sets and the layout-picture buttons.
+    void connectConfigControls();
+    bool reportCorruptOptionSet();
+    void showControlPic(const QPushButton* button);
+
     Platform& m_platform;
     cLogo m_logo;
     FileLister FileROM;
@@ -352,4 +372,6 @@ private:
     // once more after it instead of inside it.
     bool m_bRefreshing = false;
     bool m_bRefreshAgain = false;
+    // Created by the first picture button click; it deletes itself when closed.
+    QPointer<frmPicPreview> m_picPreview;
 };

@@ -12,6 +12,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QEvent>
+#include <QFocusEvent>
 #include <QGroupBox>
 #include <QKeyEvent>
 #include <QLabel>
@@ -532,6 +533,9 @@ bool frmSettings::optionControlEvent(QObject* watched, QEvent* event) {
         // Digits and Backspace only: no sign, point, blank or Enter.
         return !isNumberKey(static_cast<QKeyEvent*>(event));
     case QEvent::FocusIn:
+        // A click puts the caret where it was clicked, as a user expects.
+        if (static_cast<QFocusEvent*>(event)->reason() == Qt::MouseFocusReason)
+            return false;
         // After the field's own focus handling, which may select everything.
         QTimer::singleShot(0, field, [field] {
             field->deselect();

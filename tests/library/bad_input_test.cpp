@@ -171,6 +171,24 @@ TEST(BadInputRomFolders, AnUnreadableFolderListsNothing) {
     QFile::setPermissions(folder, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
 }
 
+// Names holding the pattern's own wildcard characters are listed like any other.
+TEST(BadInputRomFolders, NamesWithWildcardCharactersAreListed) {
+    FakePlatform fake;
+    const QString folder = fake.makeFolder("roms");
+    for (const char* name : {"*game.bin", "x*.bin", "?.bin", "*", "a.bin"})
+        fake.writeFile(QStringLiteral("roms/") + QLatin1String(name), "x");
+    FileLister lister;
+    lister.setPattern("*.bin");
+    lister.setPath(folder);
+    EXPECT_EQ(lister.names(), QStringList({"*game.bin", "?.bin", "a.bin", "x*.bin"}));
+    lister.setPattern("*");
+    lister.setPath(folder);
+    EXPECT_EQ(lister.ListCount(), 5);
+    lister.setPattern("*g*");
+    lister.setPath(folder);
+    EXPECT_EQ(lister.names(), QStringList{"*game.bin"});
+}
+
 // A name that is not valid UTF-8 (a file copied from an old Latin-1 disk) is still listed;
 // the engine then cannot reopen it by that name and says so instead of guessing.
 TEST(BadInputRomFolders, NamesThatAreNotUtf8AreListedAndReportedWhenOpened) {

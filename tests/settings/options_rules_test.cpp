@@ -174,6 +174,11 @@ TEST_F(OptionRules, NumberFieldsTakeDigitsOnlyAndPutTheCaretAtTheEnd) {
         QApplication::processEvents();
         EXPECT_FALSE(field->hasSelectedText());
         EXPECT_EQ(field->cursorPosition(), 4);
+        field->setCursorPosition(1); // a click leaves the caret where it was put
+        QFocusEvent clickedIn(QEvent::FocusIn, Qt::MouseFocusReason);
+        QApplication::sendEvent(field, &clickedIn);
+        QApplication::processEvents();
+        EXPECT_EQ(field->cursorPosition(), 1);
     }
     // Losing the focus refreshes: a value set without a reaction of its own shows.
     w.BarColorPhos->setValue(50);

@@ -1,0 +1,107 @@
+#include "emulator/OptionFile.h"
+
+#include <QElapsedTimer>
+#include <QFile>
+#include <QRandomGenerator>
+#include <QTemporaryDir>
+
+#include <unistd.h>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+const ConfigLimits kLimits{9, 13, 14};
+
+} // namespace
+
+// Option sets of random bytes: each is either a valid set or stops at a field the window
+// rejects, with every field before that one acceptable; none is read out of bounds.
+TEST(BadInputOptionFile, GarbageIsEitherAValidSetOrStopsAtTheFirstBadField) {
+    QTemporaryDir dir;
+    const QString path = dir.filePath("garbage.lum");
+    QRandomGenerator random(2600);
+    int valid = 0;
+    for (int n = 0; n < 300; ++n) {
+        QByteArray bytes(ConfigRecord::kSize, '\0');
+        for (char& c : bytes)
+            c = static_cast<char>(random.bounded(256));
+        // Small values in the int16 fields now and then, so that loads get further.
+        for (const ConfigFieldInfo& info : configFields()) {
+            const bool small =
+                info.kind == ConfigFieldKind::Check || info.kind == ConfigFieldKind::ListIndex;
+            if (small && random.bounded(4) != 0) {
+                bytes[info.offset] = static_cast<char>(random.bounded(3));
+                bytes[info.offset + 1] = 0;
+            }
+        }
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(bytes);
+        file.close();
+
+        const ConfigDecode read = readOptionFile(path, kLimits);
+        ASSERT_NE(read.status, ConfigStatus::Short);
+        ASSERT_NE(read.status, ConfigStatus::Unreadable);
+        for (int i = 0; i < read.applicableCount(); ++i)
+            EXPECT_TRUE(configFieldAcceptable(read.record, ConfigField(i), kLimits)) << n;
+        if (read.ok())
+            ++valid;
+        else
+            EXPECT_FALSE(configFieldAcceptable(read.record, *read.firstBad, kLimits)) << n;
+    }
+    EXPECT_LT(valid, 300); // random singles are rarely all whole slider values
+}
+
+// A file that exists but cannot be read is reported, not applied. Root reads through any
+// permission bits, so for root a link to /proc/self/mem stands in: it opens like a
+// regular file, and every read at its start fails.
+TEST(BadInputOptionFile, AnUnreadableFileIsReportedAndNothingApplied) {
+    QTemporaryDir dir;
+    const QString path = dir.filePath("locked.lum");
+    if (geteuid() == 0) {
+        ASSERT_TRUE(QFile::link(QStringLiteral("/proc/self/mem"), path));
+    } else {
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(ConfigRecord().encode());
+        file.close();
+        ASSERT_TRUE(QFile::setPermissions(path, {}));
+    }
+    const ConfigDecode read = readOptionFile(path, kLimits);
+    EXPECT_EQ(read.status, ConfigStatus::Unreadable);
+    EXPECT_EQ(read.applicableCount(), 0);
+}
+
+// An oversized file (a gigabyte, here sparse) is read for its first record only.
+TEST(BadInputOptionFile, AnOversizedFileIsReadForItsFirstRecordOnly) {
+    QTemporaryDir dir;
+    const QString path = dir.filePath("huge.lum");
+    ConfigRecord record;
+    record.BarColorSoundQueue = 4608;
+    {
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(record.encode());
+        ASSERT_TRUE(file.resize(qint64(1) << 30));
+    }
+    QElapsedTimer timer;
+    timer.start();
+    const ConfigDecode read = readOptionFile(path, kLimits);
+    EXPECT_LT(timer.elapsed(), 1000);
+    ASSERT_TRUE(read.ok());
+    EXPECT_EQ(read.record, record);
+}
+
+// A sound-queue value with a fraction gives a range that does not hold the value, which
+// the slider would refuse: the set is reported at that field instead of loading a value
+// the file never held.
+TEST(BadInputOptionFile, ASoundQueueWithAFractionIsRejectedAtItsField) {
+    for (const float stored : {3839.625f, 12.5f, 99.75f}) {
+        ConfigRecord record;
+        record.BarColorSoundQueue = stored;
+        const ConfigDecode read = decodeConfig(record.encode(), kLimits);
+        EXPECT_EQ(read.status, ConfigStatus::Invalid) << stored;
+        EXPECT_EQ(read.firstBad, ConfigField::BarColorSoundQueue) << stored;
+    }
+}
