@@ -287,3 +287,21 @@ TEST(BadInputMainWindow, DefaultOptionSetInEveryBadShape) {
         }
     }
 }
+
+// The emulator's documents where a folder takes the document's name: the usual message,
+// and no editor is started on a folder.
+TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
+    AppFixture app;
+    app.fake.makeFolder("emu/README.TXT");
+    app.fake.makeFolder("emu/copying.txt");
+    app.fake.writeFile("emu/z26");
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root() + "/emu");
+    frmMain& w = app.load();
+    app.fake.dialogs.boxes.clear();
+    w.mnuAboutz26Readme->trigger();
+    w.mnuAboutCopying->trigger();
+    EXPECT_TRUE(app.fake.shell.textFiles.isEmpty());
+    ASSERT_EQ(app.fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
+    EXPECT_EQ(app.fake.dialogs.boxes[1].text, "Error loading COPYING.TXT");
+}
