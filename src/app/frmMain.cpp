@@ -151,10 +151,10 @@ void frmMain::createMenus() {
     connect(mnuAboutz26HomePage, &QAction::triggered, this, &frmMain::mnuAboutz26HomePage_Click);
     connect(mnuAboutlumHomePage, &QAction::triggered, this, &frmMain::mnuAboutlumHomePage_Click);
     connect(mnuAboutlumAbout, &QAction::triggered, this, &frmMain::mnuAboutlumAbout_Click);
-
-    // Commands whose work is not part of the program yet stay visible but disabled.
-    for (QAction* pending : {mnuFileLoadSettings, mnuFileSaveSettings})
-        pending->setEnabled(false);
+    connect(mnuFileLoadSettings, &QAction::triggered, m_settings.get(),
+            &frmSettings::cmdLoadDat_Click);
+    connect(mnuFileSaveSettings, &QAction::triggered, m_settings.get(),
+            &frmSettings::cmdSaveDat_Click);
 }
 
 void frmMain::assignMenuIcons() {
@@ -187,7 +187,15 @@ void frmMain::Form_Load() {
     mcrc32 = std::make_unique<CCRC32>(m_platform.dialogs);
 
     const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
-    if (!FileExist(defaultFile)) {
+    if (FileExist(defaultFile)) {
+        if (m_settings->LoadSettings(defaultFile))
+            m_settings->lblConfig->setText(QStringLiteral("Default.lum was succesfully loaded"));
+        else
+            m_settings->lblConfig->setText(
+                QStringLiteral("Default.lum is corrupt.  Please verify settings and re-save to "
+                               "correct the problem."));
+        m_settings->lblConfig->setToolTip(QString());
+    } else {
         m_settings->lblConfig->setText(QStringLiteral("Default.lum couldn't be loaded"));
         m_settings->lblConfig->setToolTip(
             QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));

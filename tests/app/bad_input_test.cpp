@@ -14,6 +14,7 @@
 #include <QGuiApplication>
 #include <QImage>
 #include <QImageWriter>
+#include <QLabel>
 #include <QMenu>
 #include <QScreen>
 
@@ -231,4 +232,76 @@ TEST(BadInputMainWindow, ClosingOnAFullDiskLeavesTheStoreFileWhole) {
     }
     EXPECT_EQ(contents(app.fake.iniPath()), before);
     EXPECT_EQ(QDir(folder).entryList(QDir::Files | QDir::Hidden), QStringList{"lum.ini"});
+}
+
+// Default.lum in bad shapes at start-up: the start goes on, the settings window says the
+// file is corrupt (and the one message box says so too); an oversized file is read for its
+// first record.
+TEST(BadInputMainWindow, DefaultOptionSetInEveryBadShape) {
+    const QString corrupt =
+        "Default.lum is corrupt.  Please verify settings and re-save to correct the problem.";
+    const struct {
+        const char* name;
+        std::function<void(FakePlatform&)> make;
+        bool loads;
+    } cases[] = {
+        {"empty", [](FakePlatform& f) { f.writeFile("program/Default.lum"); }, false},
+        {"garbage",
+         [](FakePlatform& f) { f.writeFile("program/Default.lum", QByteArray(172, '\xFF')); },
+         false},
+        {"unreadable",
+         [](FakePlatform& f) {
+             makeUnreadable(f.programFolder() + "/Default.lum", QByteArray(172, '\0'));
+         },
+         false},
+        {"a folder", [](FakePlatform& f) { f.makeFolder("program/Default.lum"); }, false},
+        {"oversized",
+         [](FakePlatform& f) {
+             QFile file(f.programFolder() + "/Default.lum");
+             file.open(QIODevice::WriteOnly);
+             QByteArray record(172, '\0');
+             record[54 + 2] = '\x90'; // sound queue 4608.0 as a little-endian single
+             record[54 + 3] = '\x45';
+             file.write(record);
+             file.resize(qint64(1) << 30); // a gigabyte, sparse
+         },
+         true},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        AppFixture app;
+        app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+        app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+        c.make(app.fake);
+        frmMain& w = app.load();
+        EXPECT_EQ(w.windowTitle(), "lum - 1 ROM Found"); // the start went on
+        if (c.loads) {
+            EXPECT_EQ(w.settingsWindow().lblConfig->text(), "Default.lum was succesfully loaded");
+            EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+        } else {
+            EXPECT_EQ(w.settingsWindow().lblConfig->text(), corrupt);
+            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
+            EXPECT_EQ(app.fake.dialogs.boxes[0].text,
+                      ".lum file is corrupt\r\nPlease verify settings and re-save to correct this "
+                      "problem");
+        }
+    }
+}
+
+// The emulator's documents where a folder takes the document's name: the usual message,
+// and no editor is started on a folder.
+TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
+    AppFixture app;
+    app.fake.makeFolder("emu/README.TXT");
+    app.fake.makeFolder("emu/copying.txt");
+    app.fake.writeFile("emu/z26");
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root() + "/emu");
+    frmMain& w = app.load();
+    app.fake.dialogs.boxes.clear();
+    w.mnuAboutz26Readme->trigger();
+    w.mnuAboutCopying->trigger();
+    EXPECT_TRUE(app.fake.shell.textFiles.isEmpty());
+    ASSERT_EQ(app.fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
+    EXPECT_EQ(app.fake.dialogs.boxes[1].text, "Error loading COPYING.TXT");
 }

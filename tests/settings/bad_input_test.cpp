@@ -1,19 +1,30 @@
 #include "support/FakePlatform.h"
 
 #include "platform/SettingsStore.h"
+#include "settings/frmPicPreview.h"
 #include "settings/frmSettings.h"
 
+#include <QBuffer>
 #include <QCoreApplication>
 #include <QDragEnterEvent>
 #include <QDropEvent>
+#include <QFile>
+#include <QGuiApplication>
+#include <QImage>
+#include <QLabel>
 #include <QLineEdit>
 #include <QMimeData>
+#include <QScreen>
 #include <QTreeWidget>
 #include <QUrl>
 
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <memory>
+
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -119,4 +130,105 @@ TEST(BadInputStoredFolders, DamagedEntriesAreDroppedOrReadAsOff) {
     EXPECT_EQ(w->vbalListDefPaths->topLevelItem(0)->checkState(0), Qt::Unchecked);
     EXPECT_TRUE(fake.dialogs.boxes.empty());
     EXPECT_EQ(fake.reopenStore()->GetSetting(kSettings, "ROMPath"), good);
+}
+
+namespace {
+
+// A file that exists but cannot be read. Root reads through any permission bits, so for
+// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
+// its start fails.
+QString makeUnreadable(const QString& path) {
+    if (geteuid() == 0) {
+        QFile::link(QStringLiteral("/proc/self/mem"), path);
+    } else {
+        QImage(4, 4, QImage::Format_RGB32).save(path, "JPG");
+        QFile::setPermissions(path, {});
+    }
+    return path;
+}
+
+QByteArray jpeg(int width, int height) {
+    QImage image(width, height, QImage::Format_RGB32);
+    image.fill(Qt::darkCyan);
+    QByteArray bytes;
+    QBuffer buffer(&bytes);
+    buffer.open(QIODevice::WriteOnly);
+    image.save(&buffer, "JPG");
+    return bytes;
+}
+
+// A JPEG whose frame header claims the given size; the picture data after it is cut.
+QByteArray claimedJpeg(quint16 width, quint16 height) {
+    QByteArray bytes = jpeg(8, 8);
+    const qsizetype frame = bytes.indexOf("\xFF\xC0");
+    bytes[frame + 5] = static_cast<char>(height >> 8);
+    bytes[frame + 6] = static_cast<char>(height & 0xFF);
+    bytes[frame + 7] = static_cast<char>(width >> 8);
+    bytes[frame + 8] = static_cast<char>(width & 0xFF);
+    return bytes.left(frame + 40);
+}
+
+} // namespace
+
+// Controller layout pictures in bad shapes: "Error loading pic", and no window opens.
+TEST(BadInputPictures, ControllerPicturesThatCannotBeShownAreReported) {
+    const struct {
+        const char* name;
+        std::function<QString(FakePlatform&)> make;
+    } cases[] = {
+        {"empty", [](FakePlatform& f) { return f.writeFile("program/lum Paddles.jpg"); }},
+        {"truncated",
+         [](FakePlatform& f) {
+             return f.writeFile("program/lum Paddles.jpg", jpeg(64, 64).left(100));
+         }},
+        {"oversized",
+         [](FakePlatform& f) {
+             return f.writeFile("program/lum Paddles.jpg", claimedJpeg(60000, 60000));
+         }},
+        {"garbage",
+         [](FakePlatform& f) { return f.writeFile("program/lum Paddles.jpg", "\xFF\xD8junk"); }},
+        {"unreadable",
+         [](FakePlatform& f) { return makeUnreadable(f.programFolder() + "/lum Paddles.jpg"); }},
+        {"a folder", [](FakePlatform& f) { return f.makeFolder("program/lum Paddles.jpg"); }},
+        {"a FIFO",
+         [](FakePlatform& f) {
+             const QString path = f.programFolder() + "/lum Paddles.jpg";
+             ::mkfifo(QFile::encodeName(path).constData(), 0600);
+             return path;
+         }},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        FakePlatform fake;
+        const QString path = c.make(fake);
+        auto* preview = new frmPicPreview(fake.platform);
+        EXPECT_FALSE(preview->showPicture(path, "Paddle Control Layout"));
+        ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
+        EXPECT_EQ(fake.dialogs.boxes[0].text, "Error loading pic");
+        EXPECT_FALSE(preview->isVisible());
+        delete preview;
+    }
+}
+
+// Stored placements of the settings and preview windows that make no sense: the windows
+// open within the desktop's reach at a size they can be drawn at.
+TEST(BadInputPlacement, AbsurdStoredPlacesGiveWindowsThatCanBeDrawn) {
+    const QSize screen = QGuiApplication::primaryScreen()->virtualSize();
+    const int limit = 2 * std::max(screen.width(), screen.height());
+    for (const char* value : {"1e30", "-1e30", "3e9", "-3e9"}) {
+        SCOPED_TRACE(value);
+        FakePlatform fake;
+        for (const char* section : {"setpos", "picpos"})
+            for (const char* key : {"height", "width", "top", "left"})
+                fake.store.SaveSetting(section, key, value);
+        frmSettings settings(fake.platform);
+        EXPECT_LE(std::abs(settings.x()), limit);
+        EXPECT_LE(std::abs(settings.y()), limit);
+        auto* preview = new frmPicPreview(fake.platform);
+        EXPECT_LE(preview->width(), limit);
+        EXPECT_LE(preview->height(), limit);
+        EXPECT_LE(std::abs(preview->x()), limit);
+        EXPECT_FALSE(preview->grab().isNull());
+        delete preview;
+    }
 }

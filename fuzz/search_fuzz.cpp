@@ -1,0 +1,26 @@
+// MatchesSearch with any expression and any file name: the input is the expression, a NUL
+// byte and the name.
+#include "FuzzSupport.h"
+
+#include "library/Search.h"
+
+#include <algorithm>
+
+namespace {
+
+bool isAscii(const QString& s) {
+    return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    const auto [expression, name] = fuzz::twoTexts(data, size);
+    const bool match = MatchesSearch(expression, name);
+    // The name's letter case never matters (checked where case mapping is one to one).
+    if (isAscii(name)) {
+        FUZZ_CHECK(MatchesSearch(expression, name.toUpper()) == match);
+        FUZZ_CHECK(MatchesSearch(expression, name.toLower()) == match);
+    }
+    return 0;
+}
