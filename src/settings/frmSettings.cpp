@@ -310,12 +310,27 @@ void frmSettings::addRomRow(const QString& path, bool bEnabled) {
 }
 
 void frmSettings::recountRomRows() {
+    // Counting lists every folder. While the window is hidden nobody sees the counts (and
+    // at start-up the main list is listing the same folders), so they are made when the
+    // window is next shown.
+    if (!isVisible()) {
+        m_bCountsPending = true;
+        return;
+    }
+    m_bCountsPending = false;
     const QSignalBlocker quiet(vbalListDefPaths);
     for (int i = 0; i < vbalListDefPaths->topLevelItemCount(); ++i) {
         QTreeWidgetItem* row = vbalListDefPaths->topLevelItem(i);
         FileROM.setPath(row->text(0));
         row->setText(1, QString::number(FileROM.ListCount()));
     }
+    FileROM.takeNames(); // only the counts are kept, not a folder's names
+}
+
+void frmSettings::showEvent(QShowEvent* event) {
+    QWidget::showEvent(event);
+    if (m_bCountsPending)
+        recountRomRows();
 }
 
 void frmSettings::LoadDefaultPaths() {

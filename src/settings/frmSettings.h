@@ -314,6 +314,7 @@ public:
 protected:
     void closeEvent(QCloseEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
+    void showEvent(QShowEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
@@ -364,6 +365,7 @@ private:
     Platform& m_platform;
     cLogo m_logo;
     FileLister FileROM;
+    bool m_bCountsPending = false; // the folder counts wait for the window to show
     QButtonGroup* m_groupPaddleM1 = nullptr;
     QButtonGroup* m_groupPaddleM2 = nullptr;
     bool m_bUnloading = false;

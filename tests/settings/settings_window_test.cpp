@@ -44,7 +44,12 @@ QString captionOf(const QWidget* widget) {
 
 class SettingsWindow : public ::testing::Test {
 protected:
-    std::unique_ptr<frmSettings> open() { return std::make_unique<frmSettings>(fake.platform); }
+    // The window as the user sees it: shown, so its folder counts are made.
+    std::unique_ptr<frmSettings> open() {
+        auto w = std::make_unique<frmSettings>(fake.platform);
+        w->show();
+        return w;
+    }
 
     // Stores folder entry n.
     void storeFolder(int n, const QString& path, bool enabled) {
@@ -671,4 +676,15 @@ TEST_F(SettingsWindow, TheEmulatorIsChosenByDialogOrByDrop) {
     EXPECT_EQ(w->txtDefPathz26->text(), otherExecutable);
     EXPECT_EQ(stored("Z26Path"), otherExecutable);
     EXPECT_TRUE(fake.dialogs.boxes.empty());
+}
+
+TEST_F(SettingsWindow, AHiddenWindowCountsItsFoldersOnlyWhenShown) {
+    const QString roms = fake.makeFolder("roms");
+    fake.writeFile("roms/a.bin");
+    storeFolder(1, roms, true);
+    frmSettings w(fake.platform);
+    ASSERT_EQ(w.vbalListDefPaths->topLevelItemCount(), 1);
+    EXPECT_EQ(w.vbalListDefPaths->topLevelItem(0)->text(1), QString());
+    w.show();
+    EXPECT_EQ(w.vbalListDefPaths->topLevelItem(0)->text(1), "1");
 }
