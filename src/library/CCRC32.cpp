@@ -1,4 +1,5 @@
 #include "library/CCRC32.h"
+#include "library/ReadFully.h"
 
 #include "platform/Dialogs.h"
 
@@ -212,23 +213,6 @@ public:
 private:
     int m_fd;
 };
-
-// Reads up to `size` bytes, retrying short reads; the count read, or -1 on an error.
-qint64 readFully(int fd, unsigned char* buffer, qint64 size) {
-    qint64 done = 0;
-    while (done < size) {
-        const ssize_t n = ::read(fd, buffer + done, static_cast<std::size_t>(size - done));
-        if (n < 0) {
-            if (errno == EINTR)
-                continue;
-            return -1;
-        }
-        if (n == 0)
-            break;
-        done += n;
-    }
-    return done;
-}
 
 qint32 asSigned(std::uint32_t crc) {
     return static_cast<qint32>(crc);

@@ -1,6 +1,7 @@
 #include "library/GameDatabase.h"
 
 #include "library/CCRC32.h"
+#include "library/ReadFully.h"
 #include "platform/FileSystem.h"
 
 #include <QFile>
@@ -34,22 +35,6 @@ void storeLe(char* p, std::uint32_t value, int bytes) {
 // Whole records per read; a multiple of the record size keeps records whole in the buffer.
 constexpr qint64 kRecordsPerRead = 1024;
 constexpr qint64 kReadSize = kRecordsPerRead * GameRecord::kSize;
-
-qint64 readFully(int fd, unsigned char* buffer, qint64 size) {
-    qint64 done = 0;
-    while (done < size) {
-        const ssize_t n = ::read(fd, buffer + done, static_cast<std::size_t>(size - done));
-        if (n < 0) {
-            if (errno == EINTR)
-                continue;
-            return -1;
-        }
-        if (n == 0)
-            break;
-        done += n;
-    }
-    return done;
-}
 
 } // namespace
 
