@@ -236,6 +236,14 @@ void vbalProgressBar::assignRange(int& member, int value) {
 }
 
 void vbalProgressBar::redraw() {
+    // A long operation may change the picture thousands of times a second without going
+    // back to the event loop. The eye needs no more than a frame every 16 ms, so between
+    // frames the change is only queued; the operation does not wait on the screen.
+    constexpr qint64 kFrameMs = 16;
+    if (m_lastRepaint.isValid() && m_lastRepaint.elapsed() < kFrameMs) {
+        update();
+        return;
+    }
     repaint();
 }
 
@@ -463,6 +471,7 @@ void vbalProgressBar::drawControl(QPainter& painter) {
 }
 
 void vbalProgressBar::paintEvent(QPaintEvent*) {
+    m_lastRepaint.start();
     QPainter out(this);
     const qreal dpr = devicePixelRatioF();
     const int w = static_cast<int>(std::ceil(width() * dpr));

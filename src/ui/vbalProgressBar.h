@@ -2,6 +2,7 @@
 
 #include "ui/pcMemDC.h"
 
+#include <QElapsedTimer>
 #include <QImage>
 #include <QRect>
 #include <QString>
@@ -172,6 +173,7 @@ private:
     PictureHolder m_back;
     PictureHolder m_bar;
     pcMemDC m_memDC;
+    QElapsedTimer m_lastRepaint;
     // The style's contents area is asked for once per size and style, not once per Value.
     mutable QRect m_themedTrack;
     mutable QSize m_themedTrackFor;
