@@ -1,4 +1,5 @@
 #include "LocalHttpServer.h"
+#include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 
 #include "about/UpdateCheck.h"
@@ -37,28 +38,6 @@ protected:
         return kHeader + "https://example.org/forum\r\n1049613\r\nsoon\r\n" +
                server.base().toUtf8() + "/setup.run\r\n" + fileName + "\r\n0\r\n";
     }
-};
-
-// Writes fail as on a full disk while this lives: files cannot grow past `bytes`.
-class DiskFull {
-public:
-    explicit DiskFull(rlim_t bytes) {
-        getrlimit(RLIMIT_FSIZE, &m_saved);
-        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN);
-        rlimit limit = m_saved;
-        limit.rlim_cur = bytes;
-        setrlimit(RLIMIT_FSIZE, &limit);
-    }
-    ~DiskFull() {
-        setrlimit(RLIMIT_FSIZE, &m_saved);
-        std::signal(SIGXFSZ, m_oldHandler);
-    }
-    DiskFull(const DiskFull&) = delete;
-    DiskFull& operator=(const DiskFull&) = delete;
-
-private:
-    rlimit m_saved{};
-    void (*m_oldHandler)(int);
 };
 
 QByteArray noise(qsizetype size, quint32 seed) {

@@ -1,4 +1,5 @@
 #include "emulator/OptionFile.h"
+#include "support/DiskFull.h"
 
 #include <QDir>
 #include <QFile>
@@ -39,27 +40,6 @@ void writeBytes(const QString& path, const QByteArray& bytes) {
     ASSERT_EQ(f.write(bytes), bytes.size());
 }
 
-// Lowers the process's file-size limit for one scope, so that a write fails as it does
-// on a full disk; root passes every permission check, but not this.
-class FileSizeLimit {
-public:
-    explicit FileSizeLimit(rlim_t bytes) {
-        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN);
-        getrlimit(RLIMIT_FSIZE, &m_old);
-        rlimit lowered = m_old;
-        lowered.rlim_cur = bytes;
-        setrlimit(RLIMIT_FSIZE, &lowered);
-    }
-    ~FileSizeLimit() {
-        setrlimit(RLIMIT_FSIZE, &m_old);
-        std::signal(SIGXFSZ, m_oldHandler);
-    }
-
-private:
-    rlimit m_old{};
-    void (*m_oldHandler)(int);
-};
-
 } // namespace
 
 TEST(OptionFile, WrittenFileReadsBackAndReplacesAnOlderOneWhole) {
@@ -91,7 +71,7 @@ TEST(OptionFile, AFailedWriteReportsFailureAndKeepsTheOlderFile) {
     ConfigRecord changed = sampleRecord();
     changed.comboVideoMode = 1;
     {
-        const FileSizeLimit limit(100);
+        const DiskFull limit(100);
         EXPECT_FALSE(writeOptionFile(path, changed));
     }
     EXPECT_EQ(readAll(path), older);

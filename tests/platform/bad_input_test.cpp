@@ -1,3 +1,4 @@
+#include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 
 #include "platform/IniSettingsStore.h"
@@ -35,28 +36,6 @@ void makeUnreadable(const QString& path) {
         QFile::setPermissions(path, {});
     }
 }
-
-// Writes fail as on a full disk while this lives: files cannot grow past `bytes`.
-class DiskFull {
-public:
-    explicit DiskFull(rlim_t bytes) {
-        getrlimit(RLIMIT_FSIZE, &m_saved);
-        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN); // a failed write, not a dead process
-        rlimit limit = m_saved;
-        limit.rlim_cur = bytes;
-        setrlimit(RLIMIT_FSIZE, &limit);
-    }
-    ~DiskFull() {
-        setrlimit(RLIMIT_FSIZE, &m_saved);
-        std::signal(SIGXFSZ, m_oldHandler);
-    }
-    DiskFull(const DiskFull&) = delete;
-    DiskFull& operator=(const DiskFull&) = delete;
-
-private:
-    rlimit m_saved{};
-    void (*m_oldHandler)(int);
-};
 
 QByteArray contents(const QString& path) {
     QFile file(path);

@@ -1,3 +1,4 @@
+#include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 
 #include "QtPrinters.h"
@@ -77,27 +78,6 @@ QString controlState(const frmSettings& w, const ConfigFieldInfo& info) {
         return QString::number(bar->Value());
     return "<unknown kind " + name + ">";
 }
-
-// Restores a process resource limit when it goes out of scope. Lowering the file-size
-// limit makes a write fail as on a full disk, even for root.
-class FileSizeLimit {
-public:
-    explicit FileSizeLimit(rlim_t bytes) {
-        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN);
-        getrlimit(RLIMIT_FSIZE, &m_old);
-        rlimit lowered = m_old;
-        lowered.rlim_cur = bytes;
-        setrlimit(RLIMIT_FSIZE, &lowered);
-    }
-    ~FileSizeLimit() {
-        setrlimit(RLIMIT_FSIZE, &m_old);
-        std::signal(SIGXFSZ, m_oldHandler);
-    }
-
-private:
-    rlimit m_old{};
-    void (*m_oldHandler)(int);
-};
 
 class OptionSet : public ::testing::Test {
 protected:
@@ -520,7 +500,7 @@ TEST_F(OptionSet, FailedSaveSaysSoAndKeepsAnOlderFile) {
     writeBytes(older, olderBytes);
     w->lblConfig->setToolTip("tip");
     {
-        const FileSizeLimit limit(16);
+        const DiskFull limit(16);
         save(*w, older);
     }
     EXPECT_EQ(w->lblConfig->text(), "error saving older.lum");
