@@ -2,6 +2,7 @@
 
 #include "about/frmAbout.h"
 #include "app/MenuIcons.h"
+#include "emulator/ConfigRecord.h"
 #include "library/CCRC32.h"
 #include "library/GameDatabase.h"
 #include "library/RomListModel.h"
@@ -12,6 +13,7 @@
 #include "platform/SettingsStore.h"
 #include "platform/Shell.h"
 #include "platform/WebAddresses.h"
+#include "settings/DefaultPaths.h"
 #include "settings/frmSettings.h"
 #include "ui/ListView.h"
 #include "ui/OleColor.h"
@@ -51,7 +53,6 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
     setWindowTitle(QStringLiteral("lum"));
     createControls();
     createMenus();
-    m_settings->setLoadRomHandler([this](bool ForceLoad) { LoadROM(ForceLoad); });
 }
 
 frmMain::~frmMain() = default;
@@ -87,8 +88,41 @@ void frmMain::createControls() {
     picBack->hide();
     m_backdrop = loadPictureFile(m_platform.programFolder + QStringLiteral("/backdrop.png"));
     picBack->setPixmap(QPixmap::fromImage(m_backdrop));
+}
 
+frmSettings& frmMain::settingsWindow() {
+    if (!m_settings)
+        createSettingsWindow();
+    return *m_settings;
+}
+
+void frmMain::createSettingsWindow() {
+    // Built when first needed: its pages cost more than the whole main window, and
+    // nothing of them shows at start-up.
     m_settings = std::make_unique<frmSettings>(m_platform);
+    m_settings->setLoadRomHandler([this](bool ForceLoad) { LoadROM(ForceLoad); });
+    if (m_defaultOptionSet) {
+        m_settings->LoadSettings(*m_defaultOptionSet);
+        m_defaultOptionSet.reset();
+    }
+    if (m_configCaption) {
+        showConfigCaption(m_configCaption->first, m_configCaption->second);
+        m_configCaption.reset();
+    }
+    const std::vector<vbalProgressBar*> bars = {
+        m_settings->BarColorPaddle, m_settings->BarColorSoundQueue, m_settings->BarColorPhos};
+    for (vbalProgressBar* bar : bars)
+        bar->setForeColor(0);
+    applyBackgroundTo(bars);
+}
+
+void frmMain::showConfigCaption(const QString& text, const QString& tip) {
+    if (!m_settings) {
+        m_configCaption.emplace(text, tip);
+        return;
+    }
+    m_settings->lblConfig->setText(text);
+    m_settings->lblConfig->setToolTip(tip);
 }
 
 void frmMain::createMenus() {
@@ -151,10 +185,10 @@ void frmMain::createMenus() {
     connect(mnuAboutz26HomePage, &QAction::triggered, this, &frmMain::mnuAboutz26HomePage_Click);
     connect(mnuAboutlumHomePage, &QAction::triggered, this, &frmMain::mnuAboutlumHomePage_Click);
     connect(mnuAboutlumAbout, &QAction::triggered, this, &frmMain::mnuAboutlumAbout_Click);
-    connect(mnuFileLoadSettings, &QAction::triggered, m_settings.get(),
-            &frmSettings::cmdLoadDat_Click);
-    connect(mnuFileSaveSettings, &QAction::triggered, m_settings.get(),
-            &frmSettings::cmdSaveDat_Click);
+    connect(mnuFileLoadSettings, &QAction::triggered, this,
+            [this] { settingsWindow().cmdLoadDat_Click(); });
+    connect(mnuFileSaveSettings, &QAction::triggered, this,
+            [this] { settingsWindow().cmdSaveDat_Click(); });
 }
 
 void frmMain::assignMenuIcons() {
@@ -188,17 +222,20 @@ void frmMain::Form_Load() {
 
     const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
     if (FileExist(defaultFile)) {
-        if (m_settings->LoadSettings(defaultFile))
-            m_settings->lblConfig->setText(QStringLiteral("Default.lum was succesfully loaded"));
+        // A sound option set waits for the settings window; a corrupt one is reported now.
+        ConfigDecode optionSet = frmSettings::readOptionSet(defaultFile);
+        const bool loaded = optionSet.ok();
+        if (m_settings || !loaded)
+            settingsWindow().LoadSettings(optionSet);
         else
-            m_settings->lblConfig->setText(
-                QStringLiteral("Default.lum is corrupt.  Please verify settings and re-save to "
-                               "correct the problem."));
-        m_settings->lblConfig->setToolTip(QString());
+            m_defaultOptionSet = std::make_unique<ConfigDecode>(std::move(optionSet));
+        showConfigCaption(loaded ? QStringLiteral("Default.lum was succesfully loaded")
+                                 : QStringLiteral("Default.lum is corrupt.  Please verify "
+                                                  "settings and re-save to correct the problem."),
+                          QString());
     } else {
-        m_settings->lblConfig->setText(QStringLiteral("Default.lum couldn't be loaded"));
-        m_settings->lblConfig->setToolTip(
-            QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));
+        showConfigCaption(QStringLiteral("Default.lum couldn't be loaded"),
+                          QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));
     }
 
     SettingsStore& store = m_platform.store;
@@ -252,8 +289,8 @@ void frmMain::Form_Load() {
         m_platform.dialogs.MsgBox(
             this, QStringLiteral("You need to select you ROM's path before you continue."),
             MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose ROM's Path"));
-    m_settings->SelectTab(QStringLiteral("DefaultPaths"));
-    m_settings->show();
+    settingsWindow().SelectTab(QStringLiteral("DefaultPaths"));
+    settingsWindow().show();
 }
 
 void frmMain::addListColumns() {
@@ -273,7 +310,7 @@ void frmMain::RefreshMainList() {
     // columns, or its rows would not show until the next start.
     if (m_listModel->columnCount() == 0)
         addListColumns();
-    File1.setPattern(m_settings->txtDefPathFilter->text());
+    File1.setPattern(m_settings ? m_settings->txtDefPathFilter->text() : storedRomFilter(store));
     const QString search = txtSearch->text().trimmed();
 
     // Counting pass. Each enabled folder is listed once; the scanning pass below reuses
@@ -416,7 +453,8 @@ void frmMain::Form_Unload() {
             window->isVisible())
             window->close();
     }
-    m_settings->Unload();
+    if (m_settings)
+        m_settings->Unload();
 }
 
 void frmMain::mnuFileExit_Click() {
@@ -424,9 +462,10 @@ void frmMain::mnuFileExit_Click() {
 }
 
 void frmMain::mnuSettingsConfiguration_Click() {
-    m_settings->show();
-    m_settings->raise();
-    m_settings->activateWindow();
+    frmSettings& settings = settingsWindow();
+    settings.show();
+    settings.raise();
+    settings.activateWindow();
 }
 
 void frmMain::mnuMainRefresh_Click() {
@@ -578,11 +617,17 @@ void frmMain::mnuBackImgEnabled_Click() {
 }
 
 std::vector<vbalProgressBar*> frmMain::progressBars() const {
+    if (!m_settings)
+        return {vbalProgressBar1};
     return {vbalProgressBar1, m_settings->BarColorPaddle, m_settings->BarColorSoundQueue,
             m_settings->BarColorPhos};
 }
 
 void frmMain::ApplyBackground() {
+    applyBackgroundTo(progressBars());
+}
+
+void frmMain::applyBackgroundTo(const std::vector<vbalProgressBar*>& bars) {
     QImage picture;
     QImage barPicture;
     if (mnuBackImgEnabled->isChecked()) {
@@ -590,7 +635,7 @@ void frmMain::ApplyBackground() {
         barPicture =
             loadPictureFile(m_platform.store.GetSetting(kSettings, QStringLiteral("BackImg")));
     }
-    for (vbalProgressBar* bar : progressBars()) {
+    for (vbalProgressBar* bar : bars) {
         bar->setPicture(picture);
         bar->setBarPicture(barPicture);
         bar->setBarForeColor(vbalListViewCtl1->ForeColor());

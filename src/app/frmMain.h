@@ -6,8 +6,11 @@
 #include <QMainWindow>
 
 #include <memory>
+#include <optional>
+#include <utility>
 #include <vector>
 
+struct ConfigDecode;
 struct Platform;
 class frmSettings;
 class ListView;
@@ -40,7 +43,8 @@ public:
     // the switches as the user edited them.
     void LoadROM(bool ForceLoad = false);
 
-    frmSettings& settingsWindow() { return *m_settings; }
+    // The settings window, built on first use.
+    frmSettings& settingsWindow();
     RomListModel& listModel() { return *m_listModel; }
 
     // Controls, by the names the rest of the program knows them by.
@@ -105,6 +109,10 @@ private:
     void mnuBackImgChange_Click();
     void mnuBackImgEnabled_Click();
     void ApplyBackground();
+    void applyBackgroundTo(const std::vector<vbalProgressBar*>& bars);
+    void createSettingsWindow();
+    // lblConfig's caption and tip, kept until the settings window exists.
+    void showConfigCaption(const QString& text, const QString& tip);
     // The bars that follow the list's colours and picture: the refresh's progress bar and
     // the settings window's slider bars.
     std::vector<vbalProgressBar*> progressBars() const;
@@ -122,6 +130,9 @@ private:
 
     Platform& m_platform;
     std::unique_ptr<frmSettings> m_settings;
+    // Default.lum as read at start-up, applied when the settings window is built.
+    std::unique_ptr<ConfigDecode> m_defaultOptionSet;
+    std::optional<std::pair<QString, QString>> m_configCaption;
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;

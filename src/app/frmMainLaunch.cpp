@@ -74,7 +74,7 @@ void frmMain::LoadROM(bool ForceLoad) {
         return;
     }
 
-    frmSettings& settings = *m_settings;
+    frmSettings& settings = settingsWindow();
     const auto showSettingsOn = [&settings](const QString& tab) {
         settings.show();
         settings.raise();

@@ -25,6 +25,10 @@ QString withoutTrailingSeparators(QString path) {
 
 } // namespace
 
+QString storedRomFilter(const SettingsStore& store) {
+    return store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.bin"));
+}
+
 QString romPathKey(int n) {
     return entryKey(n, QLatin1String("Path"));
 }

@@ -35,6 +35,9 @@ void writeRomFolders(SettingsStore& store, const std::vector<RomFolder>& folders
 // stay reachable for the main list.
 std::vector<RomFolder> loadExistingRomFolders(SettingsStore& store);
 
+// The stored file pattern of the ROM list, "*.bin" when none is stored.
+QString storedRomFilter(const SettingsStore& store);
+
 // True when a dropped item's name marks an archive: longer than four characters and
 // ending in ".rar" in any letter case.
 bool isArchiveName(const QString& item);

@@ -130,8 +130,7 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
 frmSettings::~frmSettings() = default;
 
 void frmSettings::Form_Load() {
-    txtDefPathFilter->setText(m_platform.store.GetSetting(kSettings, QStringLiteral("ROMFilter"),
-                                                          QStringLiteral("*.bin")));
+    txtDefPathFilter->setText(storedRomFilter(m_platform.store));
 
     // The path column takes what the count column leaves, so both stay in view.
     vbalListDefPaths->setColumnCount(2);

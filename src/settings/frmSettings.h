@@ -10,6 +10,7 @@
 #include <array>
 #include <functional>
 
+struct ConfigDecode;
 struct Platform;
 class PictureBox;
 class QAction;
@@ -109,6 +110,9 @@ public:
     // and returns false, after saying so, when the file is corrupt; the two buttons (also
     // the main window's File menu) ask for a file and report in lblConfig.
     bool LoadSettings(const QString& path);
+    // The same for an option set read earlier with readOptionSet.
+    bool LoadSettings(const ConfigDecode& optionSet);
+    static ConfigDecode readOptionSet(const QString& path);
     void cmdSaveDat_Click();
     void cmdLoadDat_Click();
 

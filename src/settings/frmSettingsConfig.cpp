@@ -8,6 +8,7 @@
 #include "emulator/OptionFile.h"
 #include "platform/Dialogs.h"
 #include "platform/Platform.h"
+#include "settings/OptionLists.h"
 #include "settings/SliderRules.h"
 #include "settings/frmPicPreview.h"
 #include "ui/vbalProgressBar.h"
@@ -231,12 +232,6 @@ qint16 checkValue(const QCheckBox* box) {
     return 0;
 }
 
-ConfigLimits limitsOf(const frmSettings& w) {
-    return {w.comboVideoMode->count(),
-            std::min(w.comboLeftController->count(), w.comboRightController->count()),
-            w.comboGT->count()};
-}
-
 // The option controls as a record, read in load order.
 ConfigRecord recordFromControls(const frmSettings& w) {
     ConfigRecord record;
@@ -354,10 +349,20 @@ void frmSettings::connectConfigControls() {
             &frmSettings::cmdRightControlPic_Click);
 }
 
+ConfigDecode frmSettings::readOptionSet(const QString& path) {
+    // The lists' sizes are fixed, so a file can be checked before the window exists.
+    const ConfigLimits limits{int(kVideoModeEntries.size()), int(kControllerEntries.size()),
+                              int(kGameTypeEntries.size())};
+    return readOptionFile(path, limits);
+}
+
 bool frmSettings::LoadSettings(const QString& path) {
+    return LoadSettings(readOptionSet(path));
+}
+
+bool frmSettings::LoadSettings(const ConfigDecode& decoded) {
     // A file that cannot be read or is too short applies nothing; one with a value the
     // window rejects applies every field before that one.
-    const ConfigDecode decoded = readOptionFile(path, limitsOf(*this));
     const auto& fields = configFields();
     for (int i = 0; i < decoded.applicableCount(); ++i)
         if (!applyField(*this, decoded.record, fields[static_cast<size_t>(i)]))

@@ -4,6 +4,7 @@
 #include "settings/frmSettings.h"
 
 #include <QAction>
+#include <QApplication>
 #include <QComboBox>
 #include <QFile>
 #include <QLabel>
@@ -114,4 +115,36 @@ TEST(DefaultLumAtStart, FileMenuSavesAndLoadsOptionSets) {
     ASSERT_EQ(app.fake.dialogs.fileRequests.size(), 2u);
     EXPECT_TRUE(app.fake.dialogs.fileRequests[0].save);
     EXPECT_FALSE(app.fake.dialogs.fileRequests[1].save);
+}
+
+// The settings window is built on first use, with the options Default.lum held at start-up
+// even when the file has changed since; a session that never opened it leaves its stored
+// place alone.
+TEST(DefaultLumAtStart, TheSettingsWindowIsBuiltOnFirstUseWithTheStartOptions) {
+    const auto settingsWindows = [] {
+        int count = 0;
+        for (const QWidget* window : QApplication::topLevelWidgets())
+            count += window->objectName() == "frmSettings";
+        return count;
+    };
+    {
+        AppFixture app;
+        storePaths(app);
+        app.fake.writeFile("program/Default.lum", sampleRecord().encode());
+        app.fake.store.SaveSetting("Settings", "BackColor", "255");
+        frmMain& w = app.load();
+        EXPECT_EQ(settingsWindows(), 0);
+        app.fake.writeFile("program/Default.lum", ConfigRecord().encode());
+
+        frmSettings& settings = w.settingsWindow();
+        EXPECT_EQ(settingsWindows(), 1);
+        EXPECT_EQ(settings.comboGT->currentIndex(), 5);
+        EXPECT_EQ(settings.lblConfig->text(), "Default.lum was succesfully loaded");
+        EXPECT_EQ(settings.BarColorPhos->BarColor(), 255u); // the list's colours, as at start
+    }
+    AppFixture app;
+    storePaths(app);
+    app.load().close();
+    EXPECT_EQ(app.fake.store.GetSetting("setpos", "top"), "");
+    EXPECT_EQ(settingsWindows(), 0);
 }
