@@ -53,9 +53,52 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
     setWindowTitle(QStringLiteral("lum"));
     createControls();
     createMenus();
+    startFirstListing();
 }
 
 frmMain::~frmMain() = default;
+
+QStringList frmMain::enabledRomFolders() const {
+    const SettingsStore& store = m_platform.store;
+    QStringList folders;
+    for (int n = 1;; ++n) {
+        const QString path = store.GetSetting(kSettings, folderKey(n, "Path"));
+        if (path.isEmpty())
+            break;
+        if (readBool(store, kSettings, folderKey(n, "Checked"), false))
+            folders.push_back(path);
+    }
+    return folders;
+}
+
+void frmMain::startFirstListing() {
+    // Listing a large collection takes longer than building and showing the window, so it
+    // runs on another core meanwhile; the load's refresh takes the result over.
+    m_firstListingFolders = enabledRomFolders();
+    m_firstListingPattern = storedRomFilter(m_platform.store);
+    if (m_firstListingFolders.isEmpty() ||
+        m_platform.store.GetSetting(kSettings, QStringLiteral("Z26Path")).isEmpty())
+        return;
+    m_firstListing = std::async(
+        std::launch::async, [folders = m_firstListingFolders, pattern = m_firstListingPattern] {
+            const FilePattern filePattern(pattern);
+            std::vector<RomFolderListing> listings;
+            for (const QString& folder : folders)
+                listings.push_back({folder, listMatchingFiles(folder, filePattern)});
+            return listings;
+        });
+}
+
+std::vector<frmMain::RomFolderListing> frmMain::takeFirstListing(const QStringList& folders,
+                                                                 const QString& pattern) {
+    if (!m_firstListing.valid())
+        return {};
+    std::vector<RomFolderListing> listings = m_firstListing.get();
+    // Folders or a pattern changed since the start are listed again.
+    if (folders != m_firstListingFolders || pattern != m_firstListingPattern)
+        return {};
+    return listings;
+}
 
 void frmMain::createControls() {
     auto* central = new QWidget(this);
@@ -280,6 +323,7 @@ void frmMain::Form_Load() {
         m_bInitialLoad = false;
         return;
     }
+    m_firstListing = {}; // nothing to fill without both paths
 
     if (m_sZ26Path.isEmpty())
         m_platform.dialogs.MsgBox(
@@ -315,22 +359,19 @@ void frmMain::RefreshMainList() {
 
     // Counting pass. Each enabled folder is listed once; the scanning pass below reuses
     // the listing, so both passes see the same files.
-    struct Listing {
-        QString folder;
-        QStringList names;
-    };
-    std::vector<Listing> listings;
-    double total = 0;
-    for (int n = 1;; ++n) {
-        const QString path = store.GetSetting(kSettings, folderKey(n, "Path"));
-        if (path.isEmpty())
-            break;
-        if (!readBool(store, kSettings, folderKey(n, "Checked"), false))
-            continue;
-        File1.setPath(path);
-        total += File1.ListCount();
-        listings.push_back({path, File1.takeNames()});
+    const QStringList folderPaths = enabledRomFolders();
+    std::vector<RomFolderListing> listings;
+    if (m_bInitialLoad)
+        listings = takeFirstListing(folderPaths, File1.pattern());
+    if (listings.empty()) {
+        for (const QString& path : folderPaths) {
+            File1.setPath(path);
+            listings.push_back({path, File1.takeNames()});
+        }
     }
+    double total = 0;
+    for (const RomFolderListing& listing : listings)
+        total += static_cast<double>(listing.names.size());
 
     if (m_bInitialLoad) {
         fraSearch->setTitle(QStringLiteral("Loading ROM's List..."));
@@ -363,7 +404,7 @@ void frmMain::RefreshMainList() {
             vbalProgressBar1->setText(QString::number(percent) + u'%');
         }
     };
-    for (Listing& listing : listings) {
+    for (RomFolderListing& listing : listings) {
         const int folderIndex = static_cast<int>(folders.size());
         folders.push_back(listing.folder);
         const int count = static_cast<int>(listing.names.size());

@@ -5,6 +5,7 @@
 #include <QImage>
 #include <QMainWindow>
 
+#include <future>
 #include <memory>
 #include <optional>
 #include <utility>
@@ -128,11 +129,26 @@ private:
     // The selected row's full path, or the empty text when no row is selected.
     QString selectedRowPath() const;
 
+    struct RomFolderListing {
+        QString folder;
+        QStringList names;
+    };
+    // The enabled ROM folders, in their stored order.
+    QStringList enabledRomFolders() const;
+    void startFirstListing();
+    // The listing started with the window, when it was made for these folders and this
+    // pattern; otherwise nothing. Either way it is used up.
+    std::vector<RomFolderListing> takeFirstListing(const QStringList& folders,
+                                                   const QString& pattern);
+
     Platform& m_platform;
     std::unique_ptr<frmSettings> m_settings;
     // Default.lum as read at start-up, applied when the settings window is built.
     std::unique_ptr<ConfigDecode> m_defaultOptionSet;
     std::optional<std::pair<QString, QString>> m_configCaption;
+    std::future<std::vector<RomFolderListing>> m_firstListing;
+    QStringList m_firstListingFolders;
+    QString m_firstListingPattern;
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;

@@ -15,6 +15,8 @@
 
 #include <gtest/gtest.h>
 
+#include <malloc.h>
+
 namespace {
 
 // A main window whose first refresh already ran over the given folders.
@@ -126,12 +128,42 @@ TEST_F(RefreshTest, SearchExpressionsNarrowTheList) {
     EXPECT_EQ(names(), QStringList{"Pacific.bin"});
 }
 
-TEST_F(RefreshTest, RefreshingAgainKeepsOneRowPerFile) {
-    app.storeFolder(1, app.romFolder("roms", {"a.bin", "b.bin"}));
+// Refreshing again and again neither duplicates rows nor holds on to memory.
+TEST_F(RefreshTest, RefreshingAgainKeepsOneRowPerFileAndNoMoreMemory) {
+    QStringList files;
+    for (int i = 0; i < 2000; ++i)
+        files << QString("Game %1.bin").arg(i);
+    app.storeFolder(1, app.romFolder("roms", files));
     frmMain& w = app.load();
-    for (int i = 0; i < 5; ++i)
+    const auto heapInUse = [] { return mallinfo2().uordblks; };
+    for (int i = 0; i < 3; ++i)
         w.mnuMainRefresh->trigger();
-    EXPECT_EQ(w.listModel().rowCount(), 2);
+    const size_t before = heapInUse();
+    for (int i = 0; i < 30; ++i)
+        w.mnuMainRefresh->trigger();
+    EXPECT_EQ(w.listModel().rowCount(), 2000);
+    // A leak of even one name per row and refresh would be over a megabyte here.
+    EXPECT_LT(heapInUse(), before + 64 * 1024);
+}
+
+// The listing started with the window serves the first refresh only, and only for the
+// folders and pattern it was made for.
+TEST_F(RefreshTest, TheFirstListingServesOnlyTheLoadsRefreshOfTheSameFolders) {
+    const QString roms = app.romFolder("roms", {"a.bin", "b.a26"});
+    app.storeFolder(1, roms);
+    app.window = std::make_unique<frmMain>(app.fake.platform);
+    app.storeFolder(2, app.romFolder("more", {"c.bin"}));
+    app.window->Form_Load();
+    EXPECT_EQ(names(), (QStringList{"a.bin", "c.bin"}));
+
+    app.fake.writeFile("roms/d.bin");
+    search("");
+    EXPECT_EQ(names(), (QStringList{"a.bin", "d.bin", "c.bin"}));
+
+    app.window = std::make_unique<frmMain>(app.fake.platform);
+    app.fake.store.SaveSetting("Settings", "ROMFilter", "*.a26");
+    app.window->Form_Load();
+    EXPECT_EQ(names(), QStringList{"b.a26"});
 }
 
 TEST(SearchBox, ControlKeysInsertOperatorsAtTheCaret) {
