@@ -5,6 +5,7 @@
 #include "platform/QtDialogs.h"
 #include "platform/QtShell.h"
 #include "platform/Registry.h"
+#include "platform/ReportingSettingsStore.h"
 
 #include <QApplication>
 #include <QIcon>
@@ -15,8 +16,9 @@ int main(int argc, char** argv) {
     QApplication::setWindowIcon(QIcon(QStringLiteral(":/lum.png")));
     QGuiApplication::setDesktopFileName(QStringLiteral("lum"));
 
-    IniSettingsStore store(IniSettingsStore::defaultFilePath());
+    IniSettingsStore file(IniSettingsStore::defaultFilePath());
     QtDialogs dialogs;
+    ReportingSettingsStore store(file, dialogs, file.filePath());
     QtShell shell;
     QtDownloader network;
     ToolRegistry registry;
