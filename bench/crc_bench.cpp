@@ -1,9 +1,9 @@
 // GetCRCFromFile on a 64 MiB file against zlib's crc32 on the same bytes in memory.
 
 #include "BenchReport.h"
+#include "SilentDialogs.h"
 
 #include "library/CCRC32.h"
-#include "platform/Dialogs.h"
 
 #include <QCoreApplication>
 #include <QFile>
@@ -13,25 +13,7 @@
 
 #include <zlib.h>
 
-namespace {
-
-// Counts boxes instead of showing them; a benchmark run must show none.
-class SilentDialogs final : public Dialogs {
-public:
-    MsgResult MsgBox(QWidget*, const QString& text, MsgButtons, MsgIcon,
-                     const QString& title) override {
-        std::fprintf(stderr, "unexpected box %s: %s\n", qPrintable(title), qPrintable(text));
-        ++boxes;
-        return MsgResult::Ok;
-    }
-    QString ShowOpen(QWidget*, const FileDialogRequest&) override { return {}; }
-    QString ShowSave(QWidget*, const FileDialogRequest&) override { return {}; }
-    QString ShowFolder(QWidget*, const QString&, const QString&) override { return {}; }
-    std::optional<quint32> ShowColor(QWidget*, const QString&, quint32) override { return {}; }
-    int boxes = 0;
-};
-
-} // namespace
+namespace {} // namespace
 
 int main(int argc, char** argv) {
     QCoreApplication app(argc, argv);
@@ -54,7 +36,7 @@ int main(int argc, char** argv) {
         }
     }
 
-    SilentDialogs dialogs;
+    bench::SilentDialogs dialogs;
     CCRC32 engine(dialogs);
     engine.setInputFileName(path);
     const auto* data = reinterpret_cast<const unsigned char*>(bytes.constData());

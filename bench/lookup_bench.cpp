@@ -2,10 +2,10 @@
 // reading the database in large chunks into a reused buffer and comparing the CRC field.
 
 #include "BenchReport.h"
+#include "SilentDialogs.h"
 
 #include "library/CCRC32.h"
 #include "library/GameDatabase.h"
-#include "platform/Dialogs.h"
 
 #include <QCoreApplication>
 #include <QFile>
@@ -18,21 +18,6 @@
 #include <unistd.h>
 
 namespace {
-
-class SilentDialogs final : public Dialogs {
-public:
-    MsgResult MsgBox(QWidget*, const QString& text, MsgButtons, MsgIcon,
-                     const QString& title) override {
-        std::fprintf(stderr, "unexpected box %s: %s\n", qPrintable(title), qPrintable(text));
-        ++boxes;
-        return MsgResult::Ok;
-    }
-    QString ShowOpen(QWidget*, const FileDialogRequest&) override { return {}; }
-    QString ShowSave(QWidget*, const FileDialogRequest&) override { return {}; }
-    QString ShowFolder(QWidget*, const QString&, const QString&) override { return {}; }
-    std::optional<quint32> ShowColor(QWidget*, const QString&, quint32) override { return {}; }
-    int boxes = 0;
-};
 
 bool writeFile(const QString& path, const QByteArray& bytes) {
     QFile file(path);
@@ -75,7 +60,7 @@ int main(int argc, char** argv) {
     QByteArray rom(4096, Qt::Uninitialized);
     for (char& b : rom)
         b = static_cast<char>(rng());
-    SilentDialogs dialogs;
+    bench::SilentDialogs dialogs;
     CCRC32 engine(dialogs);
     if (!writeFile(romPath, rom)) {
         std::fprintf(stderr, "cannot write the test files\n");
