@@ -13,8 +13,6 @@
 
 #include <zlib.h>
 
-namespace {} // namespace
-
 int main(int argc, char** argv) {
     QCoreApplication app(argc, argv);
     constexpr qsizetype kSize = qsizetype(64) << 20;
