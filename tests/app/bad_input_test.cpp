@@ -1,5 +1,6 @@
 #include "AppFixture.h"
 #include "support/DiskFull.h"
+#include "support/Unreadable.h"
 
 #include "library/RomListModel.h"
 #include "platform/SettingsStore.h"
@@ -23,30 +24,12 @@
 #include <functional>
 
 #include <sys/resource.h>
-#include <unistd.h>
 
 #include <gtest/gtest.h>
 
 namespace {
 
 const QString kSettings = QStringLiteral("Settings");
-
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails (EIO).
-QString makeUnreadable(const QString& path, const QByteArray& content) {
-    QFile::remove(path);
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QFile file(path);
-        file.open(QIODevice::WriteOnly);
-        file.write(content);
-        file.close();
-        QFile::setPermissions(path, {});
-    }
-    return path;
-}
 
 QByteArray png(int width, int height) {
     QImage image(width, height, QImage::Format_RGB32);

@@ -1,5 +1,6 @@
 #include "support/DiskFull.h"
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include "platform/IniSettingsStore.h"
 #include "platform/SettingsStore.h"
@@ -15,27 +16,10 @@
 #include <functional>
 
 #include <sys/resource.h>
-#include <unistd.h>
 
 #include <gtest/gtest.h>
 
 namespace {
-
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails (EIO).
-void makeUnreadable(const QString& path) {
-    QFile::remove(path);
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QFile file(path);
-        file.open(QIODevice::WriteOnly);
-        file.write("[Settings]\nROMPath=/secret\n");
-        file.close();
-        QFile::setPermissions(path, {});
-    }
-}
 
 QByteArray contents(const QString& path) {
     QFile file(path);
@@ -83,7 +67,11 @@ TEST(BadInputSettingsFile, EveryShapeOpensAndReadsWhatItCan) {
                          QByteArray(reinterpret_cast<const char*>(text.utf16()), text.size() * 2));
          },
          "default"},
-        {"unreadable", [](const FakePlatform& f) { makeUnreadable(f.iniPath()); }, "default"},
+        {"unreadable",
+         [](const FakePlatform& f) {
+             makeUnreadable(f.iniPath(), "[Settings]\nROMPath=/secret\n");
+         },
+         "default"},
         {"a folder", [](const FakePlatform& f) { QDir().mkpath(f.iniPath()); }, "default"},
     };
     for (const Case& c : cases) {

@@ -1,4 +1,5 @@
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include "platform/SettingsStore.h"
 #include "settings/frmPicPreview.h"
@@ -24,7 +25,6 @@
 #include <memory>
 
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace {
 
@@ -134,19 +134,6 @@ TEST(BadInputStoredFolders, DamagedEntriesAreDroppedOrReadAsOff) {
 
 namespace {
 
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails.
-QString makeUnreadable(const QString& path) {
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QImage(4, 4, QImage::Format_RGB32).save(path, "JPG");
-        QFile::setPermissions(path, {});
-    }
-    return path;
-}
-
 QByteArray jpeg(int width, int height) {
     QImage image(width, height, QImage::Format_RGB32);
     image.fill(Qt::darkCyan);
@@ -188,7 +175,9 @@ TEST(BadInputPictures, ControllerPicturesThatCannotBeShownAreReported) {
         {"garbage",
          [](FakePlatform& f) { return f.writeFile("program/lum Paddles.jpg", "\xFF\xD8junk"); }},
         {"unreadable",
-         [](FakePlatform& f) { return makeUnreadable(f.programFolder() + "/lum Paddles.jpg"); }},
+         [](FakePlatform& f) {
+             return makeUnreadable(f.programFolder() + "/lum Paddles.jpg", jpeg(4, 4));
+         }},
         {"a folder", [](FakePlatform& f) { return f.makeFolder("program/lum Paddles.jpg"); }},
         {"a FIFO",
          [](FakePlatform& f) {
