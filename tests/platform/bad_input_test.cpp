@@ -14,8 +14,11 @@
 #include <cmath>
 #include <csignal>
 #include <functional>
+#include <memory>
+#include <optional>
 
 #include <sys/resource.h>
+#include <sys/stat.h>
 
 #include <gtest/gtest.h>
 
@@ -27,7 +30,27 @@ QByteArray contents(const QString& path) {
 }
 
 QStringList folderEntries(const QString& folder) {
-    return QDir(folder).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot);
+    return QDir(folder).entryList(QDir::AllEntries | QDir::System | QDir::Hidden |
+                                  QDir::NoDotAndDotDot);
+}
+
+// What identifies a file on disk: a replacement (a new file renamed into place) or a
+// rewrite changes it.
+struct FileIdentity {
+    ino_t inode = 0;
+    off_t size = 0;
+    timespec modified{};
+    bool operator==(const FileIdentity& o) const {
+        return inode == o.inode && size == o.size && modified.tv_sec == o.modified.tv_sec &&
+               modified.tv_nsec == o.modified.tv_nsec;
+    }
+};
+
+FileIdentity identity(const QString& path) {
+    struct stat info {};
+    if (::lstat(QFile::encodeName(path).constData(), &info) != 0)
+        return {};
+    return {info.st_ino, info.st_size, info.st_mtim};
 }
 
 } // namespace
@@ -73,6 +96,12 @@ TEST(BadInputSettingsFile, EveryShapeOpensAndReadsWhatItCan) {
          },
          "default"},
         {"a folder", [](const FakePlatform& f) { QDir().mkpath(f.iniPath()); }, "default"},
+        {"a FIFO", // would block a reader that opened it
+         [](const FakePlatform& f) {
+             QDir().mkpath(QFileInfo(f.iniPath()).absolutePath());
+             ::mkfifo(QFile::encodeName(f.iniPath()).constData(), 0600);
+         },
+         "default"},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.name);
@@ -181,4 +210,60 @@ TEST(BadInputSettingsWrite, AFolderInPlaceOfTheFileIsLeftAlone) {
     EXPECT_TRUE(QFileInfo(fake.iniPath()).isDir());
     EXPECT_EQ(contents(fake.iniPath() + "/keep.txt"), "mine");
     EXPECT_EQ(folderEntries(QFileInfo(fake.iniPath()).absolutePath()), QStringList{"lum.ini"});
+}
+
+// A file that is there but could not be read is never replaced by a write: that would put
+// this session's few values in place of every setting it holds. The writes fail, the values
+// stay in memory, and once the file is gone they are written.
+TEST(BadInputSettingsWrite, AFileThatCouldNotBeReadIsNotWrittenOver) {
+    const struct {
+        const char* name;
+        std::function<void(const QString& path)> make;
+        bool withoutOverride; // opened as a user without root's override of permissions
+    } cases[] = {
+        {"oversized",
+         [](const QString& path) {
+             QFile file(path);
+             file.open(QIODevice::WriteOnly);
+             file.write("[Settings]\nROMPath=/mine\n" + QByteArray(17 * 1024 * 1024, '#'));
+         },
+         false},
+        {"unreadable", [](const QString& path) { makeUnreadable(path, "[Settings]\n"); }, false},
+        {"writable but not readable",
+         [](const QString& path) {
+             QFile file(path);
+             file.open(QIODevice::WriteOnly);
+             file.write("[Settings]\nROMPath=/mine\n");
+             file.close();
+             QFile::setPermissions(path, QFile::WriteOwner);
+         },
+         true},
+        {"a FIFO", [](const QString& path) { ::mkfifo(QFile::encodeName(path).constData(), 0600); },
+         false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        FakePlatform fake;
+        QDir().mkpath(QFileInfo(fake.iniPath()).absolutePath());
+        c.make(fake.iniPath());
+        const FileIdentity before = identity(fake.iniPath());
+        ASSERT_NE(before.inode, ino_t(0));
+        std::unique_ptr<IniSettingsStore> store;
+        {
+            std::optional<NoPermissionOverride> asAnyone;
+            if (c.withoutOverride)
+                asAnyone.emplace();
+            store = std::make_unique<IniSettingsStore>(fake.iniPath());
+        }
+        EXPECT_FALSE(store->SaveSetting("Settings", "Z26Path", "/emu"));
+        EXPECT_EQ(store->GetSetting("Settings", "Z26Path"), "/emu");
+        EXPECT_TRUE(identity(fake.iniPath()) == before);
+        EXPECT_EQ(folderEntries(QFileInfo(fake.iniPath()).absolutePath()), QStringList{"lum.ini"});
+
+        ASSERT_TRUE(QFile::remove(fake.iniPath()));
+        EXPECT_TRUE(store->SaveSetting("Settings", "ROMPath", "/roms"));
+        const auto reread = fake.reopenStore();
+        EXPECT_EQ(reread->GetSetting("Settings", "Z26Path"), "/emu");
+        EXPECT_EQ(reread->GetSetting("Settings", "ROMPath"), "/roms");
+    }
 }
