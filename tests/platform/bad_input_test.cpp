@@ -161,6 +161,9 @@ TEST(BadInputSettingsValues, ReadersFallBackToTheirDefaults) {
         {"4294967296", 4294967296.0, 4294967296LL, true, dC}, // beyond 32-bit colours
         {"-2147483649", -2147483648.0, -2147483649LL, true, dC},
         {"0x10", dS, dL, true, dC},
+        {"1e", dS, dL, true, dC}, // cut short
+        {"-", dS, dL, true, dC},
+        {"Tru", dS, dL, true, dC},
         {"5 5", dS, dL, true, dC},
         {" 7 ", 7, 7, true, 7},
         {"-1", -1, -1, true, 0xFFFFFFFF},
@@ -198,6 +201,27 @@ TEST(BadInputSettingsWrite, AFailedWriteKeepsTheOldFileWhole) {
     // The next write that can succeed stores everything the session holds.
     EXPECT_TRUE(fake.store.SaveSetting("Settings", "ROMChecked", "True"));
     EXPECT_EQ(fake.reopenStore()->GetSetting("Settings", "BackImg").size(), 4096);
+}
+
+// A settings folder without write permission: every write fails, nothing appears in it, and
+// the values stay in memory.
+TEST(BadInputSettingsWrite, AReadOnlyFolderTakesNoWrite) {
+    FakePlatform fake;
+    ASSERT_TRUE(fake.store.SaveSetting("Settings", "ROMPath", "/roms"));
+    const QString folder = QFileInfo(fake.iniPath()).absolutePath();
+    const QByteArray before = contents(fake.iniPath());
+    ASSERT_TRUE(QFile::setPermissions(folder, QFile::ReadOwner | QFile::ExeOwner));
+    {
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        EXPECT_FALSE(fake.store.SaveSetting("Settings", "Z26Path", "/emu"));
+        EXPECT_FALSE(fake.store.DeleteSetting("Settings", "ROMPath"));
+    }
+    QFile::setPermissions(folder, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    EXPECT_EQ(contents(fake.iniPath()), before);
+    EXPECT_EQ(folderEntries(folder), QStringList{"lum.ini"});
+    EXPECT_EQ(fake.store.GetSetting("Settings", "Z26Path"), "/emu");
+    EXPECT_EQ(fake.store.GetSetting("Settings", "ROMPath", "deleted"), "deleted");
 }
 
 TEST(BadInputSettingsWrite, AFolderInPlaceOfTheFileIsLeftAlone) {
