@@ -267,3 +267,38 @@ TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
     EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
     EXPECT_EQ(app.fake.dialogs.boxes[1].text, "Error loading COPYING.TXT");
 }
+
+// The emulator path in bad shapes when a game is started: a path that leads nowhere is
+// reported; one that exists but does not lead to the emulator program (the emulator's
+// name taken by a folder, some other file) ends the launch without a word. Nothing starts.
+TEST(BadInputMainWindow, TheEmulatorPathInBadShapesAtLaunch) {
+    AppFixture app;
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+    frmMain& w = app.load();
+    w.vbalListViewCtl1->setCurrentIndex(w.listModel().index(0, 0));
+    const struct {
+        const char* name;
+        QString stored;
+        bool reported;
+    } cases[] = {
+        {"empty", QString(), true},
+        {"garbage", QStringLiteral("\x01<?>|\n"), true},
+        {"missing", app.fake.root() + "/gone/z26", true},
+        {"a folder named like the emulator", app.fake.makeFolder("emu/z26").chopped(4), false},
+        {"another file", app.fake.writeFile("notes.txt", "hello"), false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        app.fake.dialogs.boxes.clear();
+        app.fake.store.SaveSetting(kSettings, "Z26Path", c.stored);
+        w.LoadROM();
+        if (c.reported) {
+            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
+            EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Invalid z26 Path");
+        } else {
+            EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+        }
+    }
+    EXPECT_TRUE(app.fake.shell.started.empty());
+}

@@ -160,6 +160,27 @@ TEST(BadInputRomFolders, AnUnreadableFolderListsNothing) {
     EXPECT_EQ(lister.ListCount(), 1);
 }
 
+// A folder far bigger than a collection: every file is listed, sorted, without a pause the
+// user would take for a hang.
+TEST(BadInputRomFolders, AnOversizedFolderIsListedWhole) {
+    FakePlatform fake;
+    const QString folder = fake.makeFolder("roms");
+    constexpr int kFiles = 10000;
+    for (int i = kFiles; i > 0; --i) {
+        QFile file(folder + QStringLiteral("/Game %1.bin").arg(i, 5, 10, QLatin1Char('0')));
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    }
+    QElapsedTimer timer;
+    timer.start();
+    FileLister lister;
+    lister.setPattern("*.bin");
+    lister.setPath(folder);
+    EXPECT_LT(timer.elapsed(), 10000); // a hang guard only
+    ASSERT_EQ(lister.ListCount(), kFiles);
+    EXPECT_EQ(lister.List(0), "Game 00001.bin");
+    EXPECT_EQ(lister.List(kFiles - 1), "Game 10000.bin");
+}
+
 // Names holding the pattern's own wildcard characters are listed like any other.
 TEST(BadInputRomFolders, NamesWithWildcardCharactersAreListed) {
     FakePlatform fake;
@@ -213,6 +234,28 @@ TEST(BadInputRomFiles, EmptyAndUnreadableImagesGiveAResultWithoutHanging) {
     makeUnreadable(unreadable, "ROM");
     crc.setInputFileName(unreadable);
     EXPECT_EQ(crc.GetCRCFromFile(), 0);
+}
+
+// An image far bigger than any cartridge (64 MiB, here sparse) is read to its end, with
+// the progress reaching the whole.
+TEST(BadInputRomFiles, AnOversizedImageIsReadToItsEnd) {
+    FakePlatform fake;
+    const QString path = fake.root() + "/huge.bin";
+    {
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        ASSERT_TRUE(file.resize(qint64(64) << 20));
+    }
+    CCRC32 crc(fake.dialogs);
+    float last = -1;
+    QObject::connect(&crc, &CCRC32::Progress, [&](float value) { last = value; });
+    crc.setInputFileName(path);
+    QElapsedTimer timer;
+    timer.start();
+    EXPECT_EQ(crc.GetCRCFromFile(), static_cast<qint32>(0xB2EB30EDu)); // CRC-32 of 64 MiB of 0
+    EXPECT_LT(timer.elapsed(), 30000);                                 // a hang guard only
+    EXPECT_EQ(last, 1.0f);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
 }
 
 #if defined(LUM_CRCID_TOOL)
