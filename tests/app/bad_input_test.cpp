@@ -93,6 +93,7 @@ TEST(BadInputMainWindow, BadBackgroundPicturesShowNone) {
         const char* name;
         std::function<QString(FakePlatform&)> make;
     } cases[] = {
+        {"missing", [](FakePlatform& f) { return f.root() + "/gone.png"; }},
         {"empty", [](FakePlatform& f) { return f.writeFile("empty.png"); }},
         {"truncated", [](FakePlatform& f) { return f.writeFile("cut.png", png(64, 64).left(60)); }},
         {"oversized",
