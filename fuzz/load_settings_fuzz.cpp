@@ -14,11 +14,13 @@
 
 #include <QApplication>
 #include <QComboBox>
+#include <QDir>
 #include <QFile>
 #include <QLabel>
 #include <QTemporaryDir>
 
 #include <algorithm>
+#include <cstdlib>
 #include <map>
 #include <utility>
 
@@ -114,8 +116,8 @@ void checkWindow(frmSettings& w) {
     for (const QComboBox* list :
          {w.comboVideoMode, w.comboLeftController, w.comboRightController, w.comboGT})
         FUZZ_CHECK(list->currentIndex() >= -1 && list->currentIndex() < list->count());
-    // (A slider takes any whole value, inside its scale or not, as the user's own bars do.)
-    // The preview was rebuilt from the controls as they now are.
+    // The sliders are not checked against their scales: like the user's own bars, they
+    // take any whole value. The preview was rebuilt from the controls as they now are.
     FUZZ_CHECK(w.lblDOSOutput->text() == w.LaunchSwitches().mid(1));
 }
 
@@ -142,6 +144,8 @@ extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv) {
     new QApplication(qtArgc, qtArgv);
     harness = new Harness;
     FUZZ_CHECK(harness->dir.isValid());
+    // The harness is never destroyed, so its temporary folder goes at exit by hand.
+    std::atexit([] { QDir(harness->dir.path()).removeRecursively(); });
     // The window's start state, saved by its own Save button, is what every input starts
     // from.
     harness->dialogs.savePath = harness->startState;
