@@ -65,6 +65,15 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         const ConfigDecode again = decodeConfig(saved, kLimits);
         FUZZ_CHECK(again.ok() && again.record == decoded.record);
         FUZZ_CHECK(again.record.encode() == saved);
+
+        // The window holds its sliders as whole numbers; what it saves then loads too.
+        ConfigRecord held = decoded.record;
+        for (const ConfigFieldInfo& info : configFields())
+            if (info.kind == ConfigFieldKind::Slider || info.kind == ConfigFieldKind::SoundQueue)
+                setConfigSingle(
+                    held, info.field,
+                    static_cast<float>(*sliderValueFor(configSingle(held, info.field))));
+        FUZZ_CHECK(decodeConfig(held.encode(), kLimits).ok());
     }
     return 0;
 }

@@ -276,6 +276,10 @@ std::optional<SoundQueueScale> soundQueueScaleFor(float stored) {
     // would refuse a value outside its range.
     if (!min || !max || !value || *value < *min || *value > *max)
         return std::nullopt;
+    // A save writes the slider's whole value; one of a single digit ("0.5" held as 0) would
+    // make a file that no load accepts, so the window must not take it from a file either.
+    if (*value >= 0 && *value <= 9)
+        return std::nullopt;
     return SoundQueueScale{*min, *max, *value};
 }
 

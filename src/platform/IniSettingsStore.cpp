@@ -67,12 +67,22 @@ QString unescape(const QString& value) {
 } // namespace
 
 IniSettingsStore::IniSettingsStore(QString filePath) : m_filePath(std::move(filePath)) {
-    QFile file(m_filePath);
-    // A missing or unreadable file is an empty store; a file bigger than any store we
-    // would write is not read at all.
+    const QFileInfo info(m_filePath);
+    if (!info.exists())
+        return;
+    // An unreadable file is an empty store; so is a file bigger than any store we would
+    // write, and anything but a regular file (a pipe would block the start). Each is kept
+    // for the user to look at, not replaced.
     constexpr qint64 maxSize = 16 * 1024 * 1024;
-    if (file.open(QIODevice::ReadOnly) && file.size() <= maxSize)
-        m_sections = parse(file.readAll());
+    QFile file(m_filePath);
+    if (info.isFile() && info.size() <= maxSize && file.open(QIODevice::ReadOnly)) {
+        const QByteArray text = file.readAll();
+        if (file.error() == QFileDevice::NoError) {
+            m_sections = parse(text);
+            return;
+        }
+    }
+    m_fileUnread = true;
 }
 
 QString IniSettingsStore::defaultFilePath() {
@@ -190,6 +200,9 @@ bool IniSettingsStore::DeleteSetting(const QString& section, const QString& key)
 }
 
 bool IniSettingsStore::write() const {
+    // Writing would put this session's few values in place of everything the file holds.
+    if (m_fileUnread && QFileInfo::exists(m_filePath))
+        return false;
     QDir().mkpath(QFileInfo(m_filePath).absolutePath());
     QSaveFile file(m_filePath);
     // Unbuffered, so that a short write (a full disk) shows here: commit() flushes a

@@ -8,7 +8,9 @@
 
 // The settings store kept in an INI file: one group per section. The whole file is
 // rewritten through a temporary file and renamed into place on every change, so a
-// failed or interrupted write never leaves half a file behind.
+// failed or interrupted write never leaves half a file behind. A file that is there but
+// could not be read is never written over: the session's values stay in memory and every
+// write reports failure until that file is gone.
 class IniSettingsStore final : public SettingsStore {
 public:
     explicit IniSettingsStore(QString filePath);
@@ -42,4 +44,6 @@ private:
 
     QString m_filePath;
     std::vector<Section> m_sections;
+    // The file existed at start but its settings could not be read.
+    bool m_fileUnread = false;
 };

@@ -41,12 +41,14 @@ void LocalHttpServer::answer(QTcpSocket* socket, const QByteArray& request) {
     requests << path;
     const auto found = responses.find(path);
     const Response response =
-        found != responses.end() ? found->second : Response{404, "none", {}, false};
+        found != responses.end() ? found->second : Response{404, "none", {}, false, -1};
     if (response.silent)
         return;
     QByteArray reply = "HTTP/1.1 " + QByteArray::number(response.status) + " Status\r\n";
     reply += "Content-Type: application/octet-stream\r\n";
-    reply += "Content-Length: " + QByteArray::number(response.body.size()) + "\r\n";
+    const qsizetype length =
+        response.claimedLength >= 0 ? response.claimedLength : response.body.size();
+    reply += "Content-Length: " + QByteArray::number(length) + "\r\n";
     if (!response.location.isEmpty())
         reply += "Location: " + response.location + "\r\n";
     reply += "Connection: close\r\n\r\n" + response.body;

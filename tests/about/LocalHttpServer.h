@@ -18,6 +18,9 @@ public:
         QByteArray body;
         QByteArray location; // sent as the Location header when not empty
         bool silent = false; // accept the request and never answer
+        // When set, the length announced in the headers; the connection then closes after
+        // `body`, as when a transfer is cut off.
+        qsizetype claimedLength = -1;
     };
 
     LocalHttpServer();
@@ -32,6 +35,10 @@ public:
     }
     void fail(const QString& path, int status) { responses[path] = {status, {}, {}, false}; }
     void stall(const QString& path) { responses[path] = {200, {}, {}, true}; }
+    // Announces `claimed` bytes, sends `body` and hangs up.
+    void cutOff(const QString& path, const QByteArray& body, qsizetype claimed) {
+        responses[path] = {200, body, {}, false, claimed};
+    }
 
     // An address on which nothing listens, so connecting is refused.
     static QString refusedBase();

@@ -1,6 +1,7 @@
 #include "LocalHttpServer.h"
 #include "support/DiskFull.h"
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include "about/UpdateCheck.h"
 
@@ -10,6 +11,7 @@
 #include <QRandomGenerator>
 
 #include <csignal>
+#include <functional>
 
 #include <sys/resource.h>
 
@@ -144,4 +146,68 @@ TEST_F(BadUpdateInput, ADownloadOnAFullDiskFailsAndLeavesNoCutOffFile) {
     EXPECT_EQ(file.readAll(), "OLD INSTALLER");
     EXPECT_EQ(QDir(fake.programFolder() + "/Update").entryList(QDir::Files | QDir::Hidden),
               QStringList{"setup.run"});
+}
+
+// A program folder where nothing may be written (an installed copy): the description has
+// nowhere to go, which the check reports as a failed connection; nothing is left behind.
+TEST_F(BadUpdateInput, AReadOnlyProgramFolderIsAFailedCheck) {
+    server.serve(kDescription, newerSection("setup.run"));
+    ASSERT_TRUE(QFile::setPermissions(fake.programFolder(), QFile::ReadOwner | QFile::ExeOwner));
+    std::pair<QString, QString> box;
+    {
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        box = check();
+    }
+    QFile::setPermissions(fake.programFolder(),
+                          QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    EXPECT_EQ(box, std::make_pair(QStringLiteral("Update Check Failed"),
+                                  QStringLiteral("Failed to connect to the internet")));
+    EXPECT_TRUE(
+        QDir(fake.programFolder())
+            .isEmpty(QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot));
+}
+
+// Installers that do not arrive whole, or cannot be stored: "Download Failed", nothing is
+// started, and an older installer of the same name is kept. One that arrives empty is what
+// the server sent: it is stored and reported like any other.
+TEST_F(BadUpdateInput, InstallersThatCannotBeStoredWholeAreNotKept) {
+    const QString installer = fake.programFolder() + "/Update/setup.run";
+    const struct {
+        const char* name;
+        std::function<void()> serve;
+        bool readOnlyFolder;
+        const char* title;
+    } cases[] = {
+        {"cut off", [&] { server.cutOff("/setup.run", noise(1000, 2), 100000); }, false,
+         "Download Failed"},
+        {"read-only Update folder", [&] { server.serve("/setup.run", "NEW INSTALLER"); }, true,
+         "Download Failed"},
+        {"empty", [&] { server.serve("/setup.run", QByteArray()); }, false, "Download Complete"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        server.serve(kDescription, newerSection("setup.run"));
+        c.serve();
+        fake.writeFile("program/Update/setup.run", "OLD INSTALLER");
+        if (c.readOnlyFolder)
+            QFile::setPermissions(fake.programFolder() + "/Update",
+                                  QFile::ReadOwner | QFile::ExeOwner);
+        fake.dialogs.answers = {MsgResult::Yes};
+        fake.dialogs.boxes.clear();
+        {
+            const NoPermissionOverride asAnyone;
+            ASSERT_TRUE(asAnyone.holds());
+            UpdateCheck(fake.platform, nullptr, server.base()).Run(false);
+        }
+        QFile::setPermissions(fake.programFolder() + "/Update",
+                              QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+        ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
+        EXPECT_EQ(fake.dialogs.boxes[1].title, c.title);
+        const bool failed = QString::fromLatin1(c.title) == "Download Failed";
+        EXPECT_EQ(QFileInfo(installer).size(), failed ? 13 : 0);
+        EXPECT_EQ(QDir(fake.programFolder() + "/Update").entryList(QDir::Files | QDir::Hidden),
+                  QStringList{"setup.run"});
+    }
+    EXPECT_TRUE(fake.shell.started.empty());
 }

@@ -1,5 +1,6 @@
 #include "AppFixture.h"
 #include "support/DiskFull.h"
+#include "support/Unreadable.h"
 
 #include "library/RomListModel.h"
 #include "platform/SettingsStore.h"
@@ -23,30 +24,12 @@
 #include <functional>
 
 #include <sys/resource.h>
-#include <unistd.h>
 
 #include <gtest/gtest.h>
 
 namespace {
 
 const QString kSettings = QStringLiteral("Settings");
-
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails (EIO).
-QString makeUnreadable(const QString& path, const QByteArray& content) {
-    QFile::remove(path);
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QFile file(path);
-        file.open(QIODevice::WriteOnly);
-        file.write(content);
-        file.close();
-        QFile::setPermissions(path, {});
-    }
-    return path;
-}
 
 QByteArray png(int width, int height) {
     QImage image(width, height, QImage::Format_RGB32);
@@ -110,6 +93,7 @@ TEST(BadInputMainWindow, BadBackgroundPicturesShowNone) {
         const char* name;
         std::function<QString(FakePlatform&)> make;
     } cases[] = {
+        {"missing", [](FakePlatform& f) { return f.root() + "/gone.png"; }},
         {"empty", [](FakePlatform& f) { return f.writeFile("empty.png"); }},
         {"truncated", [](FakePlatform& f) { return f.writeFile("cut.png", png(64, 64).left(60)); }},
         {"oversized",
@@ -283,4 +267,39 @@ TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
     ASSERT_EQ(app.fake.dialogs.boxes.size(), 2u);
     EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
     EXPECT_EQ(app.fake.dialogs.boxes[1].text, "Error loading COPYING.TXT");
+}
+
+// The emulator path in bad shapes when a game is started: a path that leads nowhere is
+// reported; one that exists but does not lead to the emulator program (the emulator's
+// name taken by a folder, some other file) ends the launch without a word. Nothing starts.
+TEST(BadInputMainWindow, TheEmulatorPathInBadShapesAtLaunch) {
+    AppFixture app;
+    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
+    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+    frmMain& w = app.load();
+    w.vbalListViewCtl1->setCurrentIndex(w.listModel().index(0, 0));
+    const struct {
+        const char* name;
+        QString stored;
+        bool reported;
+    } cases[] = {
+        {"empty", QString(), true},
+        {"garbage", QStringLiteral("\x01<?>|\n"), true},
+        {"missing", app.fake.root() + "/gone/z26", true},
+        {"a folder named like the emulator", app.fake.makeFolder("emu/z26").chopped(4), false},
+        {"another file", app.fake.writeFile("notes.txt", "hello"), false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        app.fake.dialogs.boxes.clear();
+        app.fake.store.SaveSetting(kSettings, "Z26Path", c.stored);
+        w.LoadROM();
+        if (c.reported) {
+            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
+            EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Invalid z26 Path");
+        } else {
+            EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+        }
+    }
+    EXPECT_TRUE(app.fake.shell.started.empty());
 }

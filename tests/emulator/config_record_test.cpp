@@ -272,7 +272,9 @@ TEST(SoundQueueScale, RangeIsCentredOnTheStoredHundreds) {
         {65536, SoundQueueScale{65400, 65600, 65536}},
         {-5, SoundQueueScale{-100, 100, -5}},
         {12.5f, std::nullopt}, // 12 lies outside 1100 to 1300: the slider refuses it
-        {0.5f, SoundQueueScale{-100, 100, 0}},
+        {0.5f, std::nullopt},  // the slider would hold 0, which no file can give back
+        {-0.5f, std::nullopt},
+        {-0.75f, SoundQueueScale{-100, 100, -1}},
         {5, std::nullopt},
         {0, std::nullopt},
         {1e12f, std::nullopt},

@@ -3,6 +3,7 @@
 #include "library/GameDatabase.h"
 
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include <QDir>
 #include <QElapsedTimer>
@@ -16,27 +17,10 @@
 
 #include <sys/resource.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 #include <gtest/gtest.h>
 
 namespace {
-
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails (EIO).
-void makeUnreadable(const QString& path, const QByteArray& content) {
-    QFile::remove(path);
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QFile file(path);
-        file.open(QIODevice::WriteOnly);
-        file.write(content);
-        file.close();
-        QFile::setPermissions(path, {});
-    }
-}
 
 GameRecord record(qint16 id, qint32 crc) {
     GameRecord r;
@@ -158,17 +142,43 @@ TEST(BadInputRomFolders, OnlyReadableRegularFilesAreListed) {
 }
 
 TEST(BadInputRomFolders, AnUnreadableFolderListsNothing) {
-    if (geteuid() == 0)
-        GTEST_SKIP() << "root lists every folder whatever its permissions";
     FakePlatform fake;
     const QString folder = fake.makeFolder("locked");
     fake.writeFile("locked/a.bin", "x");
     ASSERT_TRUE(QFile::setPermissions(folder, {}));
     FileLister lister;
     lister.setPattern("*.*");
-    lister.setPath(folder);
+    {
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        lister.setPath(folder);
+    }
     EXPECT_EQ(lister.ListCount(), 0);
+    // The same folder once it can be read again: the listing above was refused, not empty.
     QFile::setPermissions(folder, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    lister.setPath(folder);
+    EXPECT_EQ(lister.ListCount(), 1);
+}
+
+// A folder far bigger than a collection: every file is listed, sorted, without a pause the
+// user would take for a hang.
+TEST(BadInputRomFolders, AnOversizedFolderIsListedWhole) {
+    FakePlatform fake;
+    const QString folder = fake.makeFolder("roms");
+    constexpr int kFiles = 10000;
+    for (int i = kFiles; i > 0; --i) {
+        QFile file(folder + QStringLiteral("/Game %1.bin").arg(i, 5, 10, QLatin1Char('0')));
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    }
+    QElapsedTimer timer;
+    timer.start();
+    FileLister lister;
+    lister.setPattern("*.bin");
+    lister.setPath(folder);
+    EXPECT_LT(timer.elapsed(), 10000); // a hang guard only
+    ASSERT_EQ(lister.ListCount(), kFiles);
+    EXPECT_EQ(lister.List(0), "Game 00001.bin");
+    EXPECT_EQ(lister.List(kFiles - 1), "Game 10000.bin");
 }
 
 // Names holding the pattern's own wildcard characters are listed like any other.
@@ -224,6 +234,28 @@ TEST(BadInputRomFiles, EmptyAndUnreadableImagesGiveAResultWithoutHanging) {
     makeUnreadable(unreadable, "ROM");
     crc.setInputFileName(unreadable);
     EXPECT_EQ(crc.GetCRCFromFile(), 0);
+}
+
+// An image far bigger than any cartridge (64 MiB, here sparse) is read to its end, with
+// the progress reaching the whole.
+TEST(BadInputRomFiles, AnOversizedImageIsReadToItsEnd) {
+    FakePlatform fake;
+    const QString path = fake.root() + "/huge.bin";
+    {
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        ASSERT_TRUE(file.resize(qint64(64) << 20));
+    }
+    CCRC32 crc(fake.dialogs);
+    float last = -1;
+    QObject::connect(&crc, &CCRC32::Progress, [&](float value) { last = value; });
+    crc.setInputFileName(path);
+    QElapsedTimer timer;
+    timer.start();
+    EXPECT_EQ(crc.GetCRCFromFile(), static_cast<qint32>(0xB2EB30EDu)); // CRC-32 of 64 MiB of 0
+    EXPECT_LT(timer.elapsed(), 30000);                                 // a hang guard only
+    EXPECT_EQ(last, 1.0f);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
 }
 
 #if defined(LUM_CRCID_TOOL)

@@ -1,5 +1,6 @@
 #include "support/DiskFull.h"
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include "platform/IniSettingsStore.h"
 #include "platform/SettingsStore.h"
@@ -13,29 +14,15 @@
 #include <cmath>
 #include <csignal>
 #include <functional>
+#include <memory>
+#include <optional>
 
 #include <sys/resource.h>
-#include <unistd.h>
+#include <sys/stat.h>
 
 #include <gtest/gtest.h>
 
 namespace {
-
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails (EIO).
-void makeUnreadable(const QString& path) {
-    QFile::remove(path);
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QFile file(path);
-        file.open(QIODevice::WriteOnly);
-        file.write("[Settings]\nROMPath=/secret\n");
-        file.close();
-        QFile::setPermissions(path, {});
-    }
-}
 
 QByteArray contents(const QString& path) {
     QFile file(path);
@@ -43,7 +30,27 @@ QByteArray contents(const QString& path) {
 }
 
 QStringList folderEntries(const QString& folder) {
-    return QDir(folder).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot);
+    return QDir(folder).entryList(QDir::AllEntries | QDir::System | QDir::Hidden |
+                                  QDir::NoDotAndDotDot);
+}
+
+// What identifies a file on disk: a replacement (a new file renamed into place) or a
+// rewrite changes it.
+struct FileIdentity {
+    ino_t inode = 0;
+    off_t size = 0;
+    timespec modified{};
+    bool operator==(const FileIdentity& o) const {
+        return inode == o.inode && size == o.size && modified.tv_sec == o.modified.tv_sec &&
+               modified.tv_nsec == o.modified.tv_nsec;
+    }
+};
+
+FileIdentity identity(const QString& path) {
+    struct stat info {};
+    if (::lstat(QFile::encodeName(path).constData(), &info) != 0)
+        return {};
+    return {info.st_ino, info.st_size, info.st_mtim};
 }
 
 } // namespace
@@ -83,8 +90,18 @@ TEST(BadInputSettingsFile, EveryShapeOpensAndReadsWhatItCan) {
                          QByteArray(reinterpret_cast<const char*>(text.utf16()), text.size() * 2));
          },
          "default"},
-        {"unreadable", [](const FakePlatform& f) { makeUnreadable(f.iniPath()); }, "default"},
+        {"unreadable",
+         [](const FakePlatform& f) {
+             makeUnreadable(f.iniPath(), "[Settings]\nROMPath=/secret\n");
+         },
+         "default"},
         {"a folder", [](const FakePlatform& f) { QDir().mkpath(f.iniPath()); }, "default"},
+        {"a FIFO", // would block a reader that opened it
+         [](const FakePlatform& f) {
+             QDir().mkpath(QFileInfo(f.iniPath()).absolutePath());
+             ::mkfifo(QFile::encodeName(f.iniPath()).constData(), 0600);
+         },
+         "default"},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.name);
@@ -144,6 +161,9 @@ TEST(BadInputSettingsValues, ReadersFallBackToTheirDefaults) {
         {"4294967296", 4294967296.0, 4294967296LL, true, dC}, // beyond 32-bit colours
         {"-2147483649", -2147483648.0, -2147483649LL, true, dC},
         {"0x10", dS, dL, true, dC},
+        {"1e", dS, dL, true, dC}, // cut short
+        {"-", dS, dL, true, dC},
+        {"Tru", dS, dL, true, dC},
         {"5 5", dS, dL, true, dC},
         {" 7 ", 7, 7, true, 7},
         {"-1", -1, -1, true, 0xFFFFFFFF},
@@ -183,6 +203,27 @@ TEST(BadInputSettingsWrite, AFailedWriteKeepsTheOldFileWhole) {
     EXPECT_EQ(fake.reopenStore()->GetSetting("Settings", "BackImg").size(), 4096);
 }
 
+// A settings folder without write permission: every write fails, nothing appears in it, and
+// the values stay in memory.
+TEST(BadInputSettingsWrite, AReadOnlyFolderTakesNoWrite) {
+    FakePlatform fake;
+    ASSERT_TRUE(fake.store.SaveSetting("Settings", "ROMPath", "/roms"));
+    const QString folder = QFileInfo(fake.iniPath()).absolutePath();
+    const QByteArray before = contents(fake.iniPath());
+    ASSERT_TRUE(QFile::setPermissions(folder, QFile::ReadOwner | QFile::ExeOwner));
+    {
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        EXPECT_FALSE(fake.store.SaveSetting("Settings", "Z26Path", "/emu"));
+        EXPECT_FALSE(fake.store.DeleteSetting("Settings", "ROMPath"));
+    }
+    QFile::setPermissions(folder, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    EXPECT_EQ(contents(fake.iniPath()), before);
+    EXPECT_EQ(folderEntries(folder), QStringList{"lum.ini"});
+    EXPECT_EQ(fake.store.GetSetting("Settings", "Z26Path"), "/emu");
+    EXPECT_EQ(fake.store.GetSetting("Settings", "ROMPath", "deleted"), "deleted");
+}
+
 TEST(BadInputSettingsWrite, AFolderInPlaceOfTheFileIsLeftAlone) {
     FakePlatform fake;
     QDir().mkpath(fake.iniPath());
@@ -193,4 +234,60 @@ TEST(BadInputSettingsWrite, AFolderInPlaceOfTheFileIsLeftAlone) {
     EXPECT_TRUE(QFileInfo(fake.iniPath()).isDir());
     EXPECT_EQ(contents(fake.iniPath() + "/keep.txt"), "mine");
     EXPECT_EQ(folderEntries(QFileInfo(fake.iniPath()).absolutePath()), QStringList{"lum.ini"});
+}
+
+// A file that is there but could not be read is never replaced by a write: that would put
+// this session's few values in place of every setting it holds. The writes fail, the values
+// stay in memory, and once the file is gone they are written.
+TEST(BadInputSettingsWrite, AFileThatCouldNotBeReadIsNotWrittenOver) {
+    const struct {
+        const char* name;
+        std::function<void(const QString& path)> make;
+        bool withoutOverride; // opened as a user without root's override of permissions
+    } cases[] = {
+        {"oversized",
+         [](const QString& path) {
+             QFile file(path);
+             file.open(QIODevice::WriteOnly);
+             file.write("[Settings]\nROMPath=/mine\n" + QByteArray(17 * 1024 * 1024, '#'));
+         },
+         false},
+        {"unreadable", [](const QString& path) { makeUnreadable(path, "[Settings]\n"); }, false},
+        {"writable but not readable",
+         [](const QString& path) {
+             QFile file(path);
+             file.open(QIODevice::WriteOnly);
+             file.write("[Settings]\nROMPath=/mine\n");
+             file.close();
+             QFile::setPermissions(path, QFile::WriteOwner);
+         },
+         true},
+        {"a FIFO", [](const QString& path) { ::mkfifo(QFile::encodeName(path).constData(), 0600); },
+         false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        FakePlatform fake;
+        QDir().mkpath(QFileInfo(fake.iniPath()).absolutePath());
+        c.make(fake.iniPath());
+        const FileIdentity before = identity(fake.iniPath());
+        ASSERT_NE(before.inode, ino_t(0));
+        std::unique_ptr<IniSettingsStore> store;
+        {
+            std::optional<NoPermissionOverride> asAnyone;
+            if (c.withoutOverride)
+                asAnyone.emplace();
+            store = std::make_unique<IniSettingsStore>(fake.iniPath());
+        }
+        EXPECT_FALSE(store->SaveSetting("Settings", "Z26Path", "/emu"));
+        EXPECT_EQ(store->GetSetting("Settings", "Z26Path"), "/emu");
+        EXPECT_TRUE(identity(fake.iniPath()) == before);
+        EXPECT_EQ(folderEntries(QFileInfo(fake.iniPath()).absolutePath()), QStringList{"lum.ini"});
+
+        ASSERT_TRUE(QFile::remove(fake.iniPath()));
+        EXPECT_TRUE(store->SaveSetting("Settings", "ROMPath", "/roms"));
+        const auto reread = fake.reopenStore();
+        EXPECT_EQ(reread->GetSetting("Settings", "Z26Path"), "/emu");
+        EXPECT_EQ(reread->GetSetting("Settings", "ROMPath"), "/roms");
+    }
 }

@@ -1,14 +1,17 @@
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
 #include "platform/SettingsStore.h"
 #include "settings/frmPicPreview.h"
 #include "settings/frmSettings.h"
 
 #include <QBuffer>
+#include <QComboBox>
 #include <QCoreApplication>
 #include <QDragEnterEvent>
 #include <QDropEvent>
 #include <QFile>
+#include <QFileInfo>
 #include <QGuiApplication>
 #include <QImage>
 #include <QLabel>
@@ -24,7 +27,6 @@
 #include <memory>
 
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace {
 
@@ -132,20 +134,182 @@ TEST(BadInputStoredFolders, DamagedEntriesAreDroppedOrReadAsOff) {
     EXPECT_EQ(fake.reopenStore()->GetSetting(kSettings, "ROMPath"), good);
 }
 
+// A folder dropped on the list that cannot be read is taken like any folder: it counts no
+// files, and nothing is said.
+TEST(BadInputDrops, AnUnreadableFolderIsListedWithNoFiles) {
+    FakePlatform fake;
+    const QString locked = fake.makeFolder("locked");
+    fake.writeFile("locked/a.bin");
+    ASSERT_TRUE(QFile::setPermissions(locked, {}));
+    auto w = std::make_unique<frmSettings>(fake.platform);
+    {
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        dropUrls(w->vbalListDefPaths->viewport(), {QUrl::fromLocalFile(locked)});
+        w->show();
+    }
+    ASSERT_EQ(rows(*w), QStringList{locked});
+    EXPECT_EQ(w->vbalListDefPaths->topLevelItem(0)->text(1), "0");
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(fake.reopenStore()->GetSetting(kSettings, "ROMPath"), locked);
+    QFile::setPermissions(locked, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+}
+
 namespace {
 
-// A file that exists but cannot be read. Root reads through any permission bits, so for
-// root a link to /proc/self/mem stands in: it opens like a regular file, and every read at
-// its start fails.
-QString makeUnreadable(const QString& path) {
-    if (geteuid() == 0) {
-        QFile::link(QStringLiteral("/proc/self/mem"), path);
-    } else {
-        QImage(4, 4, QImage::Format_RGB32).save(path, "JPG");
-        QFile::setPermissions(path, {});
-    }
-    return path;
+// The window's start state saved as an option set, with the game type changed so that a
+// load of it shows.
+QByteArray sampleOptionSet(FakePlatform& fake) {
+    frmSettings w(fake.platform);
+    w.comboGT->setCurrentIndex(7);
+    const QString path = fake.root() + "/sample.lum";
+    fake.dialogs.paths.push_back(path);
+    w.cmdSaveDat_Click();
+    QFile file(path);
+    file.open(QIODevice::ReadOnly);
+    return file.readAll();
 }
+
+QByteArray fileBytes(const QString& path) {
+    QFile file(path);
+    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<unreadable>");
+}
+
+} // namespace
+
+// Option sets in every bad shape through the Load button: the caption and the one message
+// box say the file is corrupt, and the window keeps what it showed; an oversized file loads
+// its first record.
+TEST(BadInputOptionSets, TheLoadButtonReportsEveryBadShape) {
+    const struct {
+        const char* name;
+        std::function<QString(FakePlatform&, const QByteArray& good)> make;
+        bool loads;
+    } cases[] = {
+        {"missing", [](FakePlatform& f, const QByteArray&) { return f.root() + "/gone.lum"; },
+         false},
+        {"empty", [](FakePlatform& f, const QByteArray&) { return f.writeFile("set.lum"); }, false},
+        {"truncated",
+         [](FakePlatform& f, const QByteArray& good) {
+             return f.writeFile("set.lum", good.left(171));
+         },
+         false},
+        {"oversized",
+         [](FakePlatform& f, const QByteArray& good) {
+             return f.writeFile("set.lum", good + QByteArray(1024 * 1024, '\xFF'));
+         },
+         true},
+        {"garbage",
+         [](FakePlatform& f, const QByteArray&) {
+             return f.writeFile("set.lum", QByteArray(172, '\xFF'));
+         },
+         false},
+        {"unreadable",
+         [](FakePlatform& f, const QByteArray& good) {
+             return makeUnreadable(f.root() + "/set.lum", good);
+         },
+         false},
+        {"a folder", [](FakePlatform& f, const QByteArray&) { return f.makeFolder("set.lum"); },
+         false},
+        {"a FIFO", // must not block the window
+         [](FakePlatform& f, const QByteArray&) {
+             const QString path = f.root() + "/set.lum";
+             ::mkfifo(QFile::encodeName(path).constData(), 0600);
+             return path;
+         },
+         false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        FakePlatform fake;
+        const QByteArray good = sampleOptionSet(fake);
+        ASSERT_EQ(good.size(), 172);
+        const QString path = c.make(fake, good);
+        const QString name = QFileInfo(path).fileName();
+        frmSettings w(fake.platform);
+        fake.dialogs.boxes.clear();
+        fake.dialogs.paths.push_back(path);
+        w.cmdLoadDat_Click();
+        if (c.loads) {
+            EXPECT_EQ(w.lblConfig->text(), name + " was succesfully loaded");
+            EXPECT_EQ(w.comboGT->currentIndex(), 7);
+            EXPECT_TRUE(fake.dialogs.boxes.empty());
+        } else {
+            EXPECT_EQ(w.lblConfig->text(),
+                      name + " is corrupt.  Plese verify settings an re-save to correct the "
+                             "problem");
+            EXPECT_EQ(w.comboGT->currentIndex(), 0);
+            ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
+            EXPECT_EQ(fake.dialogs.boxes[0].text,
+                      ".lum file is corrupt\r\nPlease verify settings and re-save to correct "
+                      "this problem");
+        }
+    }
+}
+
+// Save targets in every bad shape: a file there, whatever it holds, is replaced by the whole
+// record; a target that cannot be written says "error saving" and what was there stays.
+TEST(BadInputOptionSets, TheSaveButtonReplacesOrReportsEveryShape) {
+    const struct {
+        const char* name;
+        std::function<QString(FakePlatform&)> make; // the path chosen
+        bool saves;
+    } cases[] = {
+        {"missing", [](FakePlatform& f) { return f.root() + "/set.lum"; }, true},
+        {"empty", [](FakePlatform& f) { return f.writeFile("set.lum"); }, true},
+        {"truncated", [](FakePlatform& f) { return f.writeFile("set.lum", "\x01\x02"); }, true},
+        {"oversized",
+         [](FakePlatform& f) { return f.writeFile("set.lum", QByteArray(1024 * 1024, 'x')); },
+         true},
+        {"garbage", [](FakePlatform& f) { return f.writeFile("set.lum", QByteArray(172, '\xA5')); },
+         true},
+        {"a missing folder", [](FakePlatform& f) { return f.root() + "/gone/set.lum"; }, false},
+        {"a read-only folder",
+         [](FakePlatform& f) {
+             const QString path = f.writeFile("locked/set.lum", "older");
+             QFile::setPermissions(f.root() + "/locked", QFile::ReadOwner | QFile::ExeOwner);
+             return path;
+         },
+         false},
+        {"a folder",
+         [](FakePlatform& f) {
+             f.writeFile("set.lum/keep.txt", "older");
+             return f.root() + "/set.lum";
+         },
+         false},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        FakePlatform fake;
+        const QString path = c.make(fake);
+        const QFileInfo info(path);
+        const QByteArray before = info.isDir() ? fileBytes(path + "/keep.txt") : fileBytes(path);
+        frmSettings w(fake.platform);
+        fake.dialogs.paths.push_back(path);
+        {
+            const NoPermissionOverride asAnyone;
+            ASSERT_TRUE(asAnyone.holds());
+            w.cmdSaveDat_Click();
+        }
+        const QString name = info.fileName();
+        if (c.saves) {
+            EXPECT_EQ(w.lblConfig->text(), name + " was succesfully saved");
+            EXPECT_EQ(fileBytes(path).size(), 172);
+            frmSettings again(fake.platform);
+            EXPECT_TRUE(again.LoadSettings(path));
+        } else {
+            EXPECT_EQ(w.lblConfig->text(), "error saving " + name);
+            if (info.isDir())
+                EXPECT_EQ(fileBytes(path + "/keep.txt"), before);
+            else
+                EXPECT_EQ(fileBytes(path), before);
+        }
+        QFile::setPermissions(fake.root() + "/locked",
+                              QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    }
+}
+
+namespace {
 
 QByteArray jpeg(int width, int height) {
     QImage image(width, height, QImage::Format_RGB32);
@@ -188,7 +352,9 @@ TEST(BadInputPictures, ControllerPicturesThatCannotBeShownAreReported) {
         {"garbage",
          [](FakePlatform& f) { return f.writeFile("program/lum Paddles.jpg", "\xFF\xD8junk"); }},
         {"unreadable",
-         [](FakePlatform& f) { return makeUnreadable(f.programFolder() + "/lum Paddles.jpg"); }},
+         [](FakePlatform& f) {
+             return makeUnreadable(f.programFolder() + "/lum Paddles.jpg", jpeg(4, 4));
+         }},
         {"a folder", [](FakePlatform& f) { return f.makeFolder("program/lum Paddles.jpg"); }},
         {"a FIFO",
          [](FakePlatform& f) {
