@@ -1,4 +1,5 @@
 #include "LocalHttpServer.h"
+#include "support/QtPrinters.h"
 
 #include "platform/Downloader.h"
 #include "platform/Registry.h"
@@ -23,28 +24,23 @@ void writeFile(const QString& path, const QByteArray& content) {
     file.write(content);
 }
 
-TEST(DownloadFileTest, StoresTheBodyFollowingRedirects) {
+// A success replaces the older file with the whole body, after redirects. Every failure
+// returns false, in bounded time, and leaves the older file exactly as it was, with no
+// temporary file beside it.
+TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     QTemporaryDir dir;
     LocalHttpServer server;
-    QtDownloader downloader;
+    QtDownloader patient, downloader{std::chrono::milliseconds(300)};
     const QString target = dir.path() + "/file.bin";
     const QByteArray body(300000, 'x'); // several network reads
     server.redirect("/old", server.base() + "/new");
     server.serve("/new", body);
     writeFile(target, "older");
-    EXPECT_TRUE(downloader.DownloadFile(server.base() + "/old", target));
+    EXPECT_TRUE(patient.DownloadFile(server.base() + "/old", target));
     EXPECT_EQ(readAll(target), body);
     EXPECT_EQ(server.requests, (QStringList{"/old", "/new"}));
-    EXPECT_FALSE(downloader.DownloadFile(server.base() + "/x", dir.path() + "/no/such/file"));
-}
+    EXPECT_FALSE(downloader.DownloadFile(server.base() + "/new", dir.path() + "/no/such/file"));
 
-// Every failure returns false, in bounded time, and leaves the older file exactly as it
-// was, with no temporary file beside it.
-TEST(DownloadFileTest, FailuresKeepTheOlderFile) {
-    QTemporaryDir dir;
-    LocalHttpServer server;
-    QtDownloader downloader{std::chrono::milliseconds(300)};
-    const QString target = dir.path() + "/file.bin";
     server.fail("/broken", 500);
     server.stall("/silent");
     for (const QString& url : {server.base() + "/gone", server.base() + "/broken",
@@ -62,18 +58,15 @@ TEST(DownloadFileTest, FailuresKeepTheOlderFile) {
 
 TEST(ToolRegistryTest, AnswersTheToolLookupFromPathOnly) {
     QTemporaryDir bin;
-    const auto makeTool = [&](const QString& name) {
-        writeFile(bin.path() + u'/' + name, "#!/bin/sh\n");
-        QFile::setPermissions(bin.path() + u'/' + name, QFile::ReadOwner | QFile::ExeOwner);
-    };
     const QByteArray savedPath = qgetenv("PATH");
     qputenv("PATH", bin.path().toUtf8());
     ToolRegistry registry;
     const QString key = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools\\MSINFO");
-
     EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine, key, "PATH"));
-    makeTool("gnome-system-monitor");
-    makeTool("hardinfo");
+    for (const char* tool : {"gnome-system-monitor", "hardinfo"}) {
+        writeFile(bin.path() + u'/' + tool, "#!/bin/sh\n");
+        QFile::setPermissions(bin.path() + u'/' + tool, QFile::ReadOwner | QFile::ExeOwner);
+    }
     const auto value = registry.QueryValue(kHkeyLocalMachine, key, "PATH");
     ASSERT_TRUE(value);
     EXPECT_EQ(value->type, kRegString);
