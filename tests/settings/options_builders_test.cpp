@@ -1,6 +1,5 @@
 #include "support/FakePlatform.h"
-
-#include "QtPrinters.h"
+#include "support/QtPrinters.h"
 
 #include "settings/SwitchRules.h"
 #include "settings/frmSettings.h"
@@ -126,55 +125,39 @@ TEST_F(SwitchBuilders, OptionGroupsAndListsGiveTheirSwitch) {
     EXPECT_EQ(w.GameType(), " -g13");
     w.comboGT->setCurrentIndex(-1);
     EXPECT_EQ(w.GameType(), " -g-1");
-}
 
-TEST_F(SwitchBuilders, SlidersSpeakAwayFromTheirDefaultAndThePaddleWithItsFrame) {
-    const std::pair<int, const char*> phos[] = {{76, " -f76"}, {77, ""}, {0, " -f0"}};
-    for (const auto& [value, expected] : phos) {
-        w.BarColorPhos->setValue(value);
-        EXPECT_EQ(w.Phos(), expected);
+    // Mouse paddles: {mouse 1's paddle, mouse 2's, switch}, -1 for "None".
+    for (const auto& [m1, m2, expected] :
+         {std::tuple{3, -1, " -m3"}, {-1, 2, " -m2"}, {0, 3, " -m103"}, {-1, -1, ""}}) {
+        (m1 < 0 ? w.optPaddleM1None : w.optPaddleM1[m1])->setChecked(true);
+        (m2 < 0 ? w.optPaddleM2None : w.optPaddleM2[m2])->setChecked(true);
+        EXPECT_EQ(w.Paddle(), expected) << m1 << ' ' << m2;
     }
-    const std::pair<int, const char*> queue[] = {{4607, " -s4607"}, {4608, ""}};
-    for (const auto& [value, expected] : queue) {
-        w.BarColorSoundQueue->setValue(value);
-        EXPECT_EQ(w.SoundQueue(), expected);
-    }
-    w.BarColorPaddle->setValue(6);
-    EXPECT_EQ(w.PaddleSens(), " -p6");
-    w.fraPaddleSens->setEnabled(false);
-    EXPECT_EQ(w.PaddleSens(), "");
 }
 
 TEST_F(SwitchBuilders, NumberFieldsAreTidiedWhetherOrNotTheirSwitchIsOn) {
-    const std::pair<const char*, const char*> texts[] = {
-        {"0012", "12"}, {"", "0"}, {"2.50", "2.5"}, {"12abc", "12"}, {"abc", "0"}};
-    for (const auto& [typed, tidy] : texts) {
-        w.chkScanLines->setChecked(false);
+    w.chkLineScan->setChecked(true);
+    for (const auto& [typed, tidy] :
+         {std::pair{"0012", "12"}, {"", "0"}, {"2.50", "2.5"}, {"12abc", "12"}, {"abc", "0"}}) {
         w.txtScanLines->setText(QLatin1String(typed));
-        EXPECT_EQ(w.ScanLines(), "");
+        EXPECT_EQ(w.ScanLines(), ""); // its box is off
         EXPECT_EQ(w.txtScanLines->text(), tidy);
-        w.chkLineScan->setChecked(true);
         w.txtLineScan->setText(QLatin1String(typed));
         EXPECT_EQ(w.LineScan(), " -u" + QLatin1String(tidy));
         EXPECT_EQ(w.txtLineScan->text(), tidy);
     }
-    w.chkScanLines->setChecked(true);
-    EXPECT_EQ(w.ScanLines(), " -h0");
-
     // The light gun's fields are tidied even while its frame keeps them off the line.
     w.txtLightGunCycles->setText(QStringLiteral("03"));
     w.txtLightGunScan->setText(QString());
     EXPECT_EQ(w.LightGun(), "");
-    EXPECT_EQ(w.txtLightGunCycles->text(), "3");
-    EXPECT_EQ(w.txtLightGunScan->text(), "0");
+    EXPECT_EQ(w.txtLightGunCycles->text() + w.txtLightGunScan->text(), "30");
     w.comboLeftController->setCurrentIndex(5);
     EXPECT_EQ(w.LightGun(), " -l3 -a0");
 
     // Custom frame rate and lower sensitivity pass their text on untidied.
     w.optFPScustom->setChecked(true);
-    const std::pair<const char*, const char*> rates[] = {
-        {" 60 ", " -r60"}, {"", " -r"}, {"5x", " -r5x"}};
-    for (const auto& [typed, expected] : rates) {
+    for (const auto& [typed, expected] :
+         {std::pair{" 60 ", " -r60"}, {"", " -r"}, {"5x", " -r5x"}}) {
         w.txtFPScustom->setText(QLatin1String(typed));
         EXPECT_EQ(w.FPS(), expected);
         EXPECT_EQ(w.txtFPScustom->text(), typed);
@@ -194,18 +177,6 @@ TEST_F(SwitchBuilders, InactivatedControllersCountOnlyExactlyCheckedAndEnabled) 
     EXPECT_EQ(w.IPC(), " -iMJS");
     w.chkIPCJoystick->setCheckState(Qt::PartiallyChecked); // re-derives: keyboard enabled
     EXPECT_EQ(w.IPC(), " -iKMS");
-}
-
-TEST_F(SwitchBuilders, MousePaddlesCombineTheSelectedPaddleOfEachMouse) {
-    const struct {
-        int m1, m2;
-        const char* expected;
-    } table[] = {{3, -1, " -m3"}, {-1, 2, " -m2"}, {0, 3, " -m103"}, {-1, -1, ""}};
-    for (const auto& row : table) {
-        (row.m1 < 0 ? w.optPaddleM1None : w.optPaddleM1[row.m1])->setChecked(true);
-        (row.m2 < 0 ? w.optPaddleM2None : w.optPaddleM2[row.m2])->setChecked(true);
-        EXPECT_EQ(w.Paddle(), row.expected) << row.m1 << ' ' << row.m2;
-    }
 }
 
 TEST_F(SwitchBuilders, TheLaunchTakesItsBuildersInTheirFixedOrder) {

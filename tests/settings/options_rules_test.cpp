@@ -1,6 +1,5 @@
 #include "support/FakePlatform.h"
-
-#include "QtPrinters.h"
+#include "support/QtPrinters.h"
 
 #include "settings/frmSettings.h"
 #include "ui/cTextBoxXP.h"
@@ -79,44 +78,36 @@ TEST_F(OptionRules, EveryOptionControlRefreshesThePreview) {
     EXPECT_EQ(preview(), before);
 }
 
-TEST_F(OptionRules, TheLightGunFrameFollowsEitherPort) {
-    w.comboRightController->setCurrentIndex(5);
-    EXPECT_FALSE(w.fraLightgun->isHidden());
-    EXPECT_TRUE(w.fraLightgun->isEnabled());
-    EXPECT_TRUE(previewHas("-l0") && previewHas("-a0"));
-    w.comboRightController->setCurrentIndex(0);
-    EXPECT_TRUE(w.fraLightgun->isHidden());
-    EXPECT_FALSE(w.fraLightgun->isEnabled());
-    EXPECT_FALSE(preview().contains("-l") || preview().contains("-a"));
-}
-
-TEST_F(OptionRules, ThePortsDecideWhichPcControllersCanBeInactivated) {
-    const struct {
-        int left, right;
-        bool keyboard, mouse, joystick, stella;
-    } table[] = {
-        {3, 3, true, false, false, false},    // Keypad on both ports
-        {12, 12, false, false, false, false}, // no controller on either
-        {0, 12, true, true, true, true},      // AutoDetect on one port
-        {11, 11, false, true, false, false},  // Amiga Mouse on both
-        {3, 5, true, true, false, false},     // Keypad, LightGun
+TEST_F(OptionRules, ThePortsDecideTheLightGunAndWhichPcControllersCanBeInactivated) {
+    // Ports, then whether the light gun frame shows and the boxes keyboard, mouse, joystick
+    // and Stelladaptor can be used ("kmjs", "-" for a disabled box).
+    const std::tuple<int, int, bool, const char*> table[] = {
+        {3, 3, false, "k---"},   // Keypad on both ports
+        {12, 12, false, "----"}, // no controller on either
+        {0, 12, false, "kmjs"},  // AutoDetect on one port
+        {11, 11, false, "-m--"}, // Amiga Mouse on both
+        {3, 5, true, "km--"},    // Keypad, LightGun
+        {0, 0, false, "kmjs"},   // back to AutoDetect: no light gun
     };
     w.chkIPCMouse->setChecked(true);
-    for (const auto& row : table) {
-        w.comboLeftController->setCurrentIndex(row.left);
-        w.comboRightController->setCurrentIndex(row.right);
-        SCOPED_TRACE(testing::Message() << row.left << ' ' << row.right);
-        EXPECT_EQ(w.chkIPCKeyboard->isEnabled(), row.keyboard);
-        EXPECT_EQ(w.chkIPCMouse->isEnabled(), row.mouse);
-        EXPECT_EQ(w.chkIPCJoystick->isEnabled(), row.joystick);
-        EXPECT_EQ(w.chkIPCStella->isEnabled(), row.stella);
+    for (const auto& [left, right, lightGun, boxes] : table) {
+        w.comboLeftController->setCurrentIndex(left);
+        w.comboRightController->setCurrentIndex(right);
+        SCOPED_TRACE(testing::Message() << left << ' ' << right);
+        QString enabled;
+        for (const QCheckBox* box :
+             {w.chkIPCKeyboard, w.chkIPCMouse, w.chkIPCJoystick, w.chkIPCStella})
+            enabled += box->isEnabled() ? box->objectName().at(6).toLower() : u'-';
+        EXPECT_EQ(enabled, boxes);
         EXPECT_TRUE(w.chkIPCMouse->isChecked()); // disabled, not cleared
-        EXPECT_EQ(previewHas("-iM"), row.mouse);
+        EXPECT_EQ(previewHas("-iM"), w.chkIPCMouse->isEnabled());
+        EXPECT_EQ(!w.fraLightgun->isHidden() && w.fraLightgun->isEnabled(), lightGun);
+        EXPECT_EQ(previewHas("-l0") && previewHas("-a0"), lightGun);
+        EXPECT_EQ(preview().contains("-l") || preview().contains("-a"), lightGun);
         // No keyboard, no keyboard paddle.
-        EXPECT_EQ(w.fraPaddleSens->isHidden(), !row.keyboard);
-        EXPECT_EQ(preview().contains("-p"), row.keyboard);
+        EXPECT_EQ(w.fraPaddleSens->isHidden(), !w.chkIPCKeyboard->isEnabled());
+        EXPECT_EQ(preview().contains("-p"), w.chkIPCKeyboard->isEnabled());
     }
-    w.comboLeftController->setCurrentIndex(0);
     w.chkIPCKeyboard->click();
     EXPECT_TRUE(w.fraPaddleSens->isHidden());
     EXPECT_FALSE(preview().contains("-p"));
@@ -148,12 +139,20 @@ TEST_F(OptionRules, ClearedFieldsShowZeroOnceAndRefreshOnce) {
     EXPECT_EQ(fieldChanges.count() + previewChanges.count(), 3);
 }
 
-TEST_F(OptionRules, NumberFieldsTakeDigitsOnlyAndPutTheCaretAtTheEnd) {
+TEST_F(OptionRules, NumberFieldsAreSwitchedOnFocusedAndTakeDigitsOnly) {
     showActive();
-    w.chkScanLines->click();
-    w.chkLineScan->click();
-    w.chkLowerSens->click();
-    w.optFPScustom->click();
+    // Each box or button enables its field and moves the focus into it.
+    const std::tuple<QAbstractButton*, QLineEdit*, const char*> pairs[] = {
+        {w.chkLineScan, w.txtLineScan, "Debug"},
+        {w.chkScanLines, w.txtScanLines, "Video"},
+        {w.chkLowerSens, w.txtLowerSens, "PaddlesAudio"},
+        {w.optFPScustom, w.txtFPScustom, "Video"}};
+    for (const auto& [control, field, tab] : pairs) {
+        w.SelectTab(QLatin1String(tab));
+        control->click();
+        EXPECT_TRUE(field->isEnabled()) << qPrintable(field->objectName());
+        EXPECT_EQ(QApplication::focusWidget(), field) << qPrintable(field->objectName());
+    }
     w.comboLeftController->setCurrentIndex(5);
     for (QLineEdit* field : {w.txtFPScustom, w.txtLightGunCycles, w.txtLightGunScan, w.txtLineScan,
                              w.txtLowerSens, w.txtScanLines}) {
@@ -167,18 +166,18 @@ TEST_F(OptionRules, NumberFieldsTakeDigitsOnlyAndPutTheCaretAtTheEnd) {
         QTest::keyClick(field, Qt::Key_Delete);
         EXPECT_EQ(field->text(), "2");
 
+        // Keyboard focus puts the caret at the end, selecting nothing; a click leaves the
+        // caret where it was put.
         field->setText(QStringLiteral("1234"));
-        field->setCursorPosition(0);
-        QFocusEvent focusIn(QEvent::FocusIn, Qt::TabFocusReason); // selects all by itself
-        QApplication::sendEvent(field, &focusIn);
-        QApplication::processEvents();
-        EXPECT_FALSE(field->hasSelectedText());
-        EXPECT_EQ(field->cursorPosition(), 4);
-        field->setCursorPosition(1); // a click leaves the caret where it was put
-        QFocusEvent clickedIn(QEvent::FocusIn, Qt::MouseFocusReason);
-        QApplication::sendEvent(field, &clickedIn);
-        QApplication::processEvents();
-        EXPECT_EQ(field->cursorPosition(), 1);
+        for (const auto& [reason, from, to] :
+             {std::tuple{Qt::TabFocusReason, 0, 4}, {Qt::MouseFocusReason, 1, 1}}) {
+            field->setCursorPosition(from);
+            QFocusEvent focusIn(QEvent::FocusIn, reason); // Qt itself would select all
+            QApplication::sendEvent(field, &focusIn);
+            QApplication::processEvents();
+            EXPECT_FALSE(field->hasSelectedText());
+            EXPECT_EQ(field->cursorPosition(), to);
+        }
     }
     // Losing the focus refreshes: a value set without a reaction of its own shows.
     w.BarColorPhos->setValue(50);
@@ -186,21 +185,9 @@ TEST_F(OptionRules, NumberFieldsTakeDigitsOnlyAndPutTheCaretAtTheEnd) {
     QFocusEvent focusOut(QEvent::FocusOut, Qt::TabFocusReason);
     QApplication::sendEvent(w.txtLowerSens, &focusOut);
     EXPECT_TRUE(previewHas("-f50"));
-}
 
-TEST_F(OptionRules, BoxesAndFrameRateEnableTheirFieldAndFocusIt) {
-    showActive();
-    const std::tuple<QAbstractButton*, QLineEdit*, const char*> pairs[] = {
-        {w.chkLineScan, w.txtLineScan, "Debug"},
-        {w.chkScanLines, w.txtScanLines, "Video"},
-        {w.chkLowerSens, w.txtLowerSens, "PaddlesAudio"},
-        {w.optFPScustom, w.txtFPScustom, "Video"}};
-    for (const auto& [control, field, tab] : pairs) {
-        w.SelectTab(QLatin1String(tab));
-        control->click();
-        EXPECT_TRUE(field->isEnabled()) << qPrintable(field->objectName());
-        EXPECT_EQ(QApplication::focusWidget(), field) << qPrintable(field->objectName());
-    }
+    // Switched off, the fields are disabled again; so is the frame rate's by its other
+    // buttons.
     for (QAbstractButton* off :
          std::initializer_list<QAbstractButton*>{w.chkLineScan, w.chkScanLines, w.chkLowerSens})
         off->click();
@@ -220,10 +207,9 @@ TEST_F(OptionRules, PickingAVideoModeUnderDefaultWarnsEachTime) {
         BalloonTip* tip = cTextBoxXP::shownOn(w.txtVidModeBalloon);
         ASSERT_NE(tip, nullptr) << pick;
         EXPECT_EQ(tip->icon(), 1);
-        EXPECT_EQ(tip->title(), "Default Video Mode Selected");
-        EXPECT_EQ(tip->text(),
-                  "You need to select either 'Fullscreen' or\r\n'Window' for the Video "
-                  "Mode to be enabled.");
+        EXPECT_EQ(tip->title() + "|" + tip->text(),
+                  "Default Video Mode Selected|You need to select either 'Fullscreen' or\r\n"
+                  "'Window' for the Video Mode to be enabled.");
         tip->close();
     }
     EXPECT_EQ(w.comboVideoMode->currentIndex(), 5); // the pick stays
