@@ -1,16 +1,24 @@
-#include "support/FakePlatform.h"
-#include "support/QtPrinters.h"
+#include "support/Boxes.h"
 
 #include "platform/SettingsStore.h"
+#include "settings/PictureFit.h"
 #include "settings/frmPicPreview.h"
+#include "settings/frmSettings.h"
 #include "ui/Twips.h"
 
+#include <QComboBox>
 #include <QCoreApplication>
 #include <QImage>
 #include <QLabel>
 #include <QPointer>
+#include <QPushButton>
+#include <QTest>
 
 #include <gtest/gtest.h>
+
+static void PrintTo(const PictureFit& f, std::ostream* out) {
+    *out << "{top " << f.top << ", left " << f.left << ", " << f.width << " x " << f.height << "}";
+}
 
 namespace {
 
@@ -149,4 +157,97 @@ TEST_F(PicturePreview, TakesItsOwnersIcon) {
     frmPicPreview* preview = open({}, &owner);
     EXPECT_EQ(preview->windowIcon().cacheKey(), owner.windowIcon().cacheKey());
     EXPECT_TRUE(preview->isWindow());
+}
+
+TEST(FitPictureToBox, FillsOneAxisAndCentresOnTheOther) {
+    const struct {
+        const char* what;
+        QSizeF picture; // width x height
+        float height, width;
+        bool frame;
+        float top, left;
+        PictureFit fit;
+    } cases[] = {
+        {"wider than the box", {200, 100}, 1000, 1000, false, 0, 0, {250, 0, 1000, 500}},
+        {"taller than the box", {100, 200}, 1000, 1000, false, 0, 0, {0, 250, 500, 1000}},
+        {"same proportions", {300, 150}, 300, 600, false, 0, 0, {0, 0, 600, 300}},
+        {"tiny picture is scaled up", {4, 3}, 600, 400, false, 0, 0, {150, 0, 400, 300}},
+        // The preview window's first size, less its frame: 10990 x 5130 twips.
+        {"outer size with frame", {640, 480}, 5655, 11115, true, 0, 0, {0, 2075, 6840, 5130}},
+        {"frame, wide picture", {1000, 100}, 1525, 1125, true, 0, 0, {450, 0, 1000, 100}},
+        // The caller's start is added on the axis that is centred and kept on the other.
+        {"start offsets, wider", {200, 100}, 1000, 1000, false, 10, 20, {260, 20, 1000, 500}},
+        {"start offsets, taller", {100, 200}, 1000, 1000, false, 10, 20, {10, 270, 500, 1000}},
+    };
+    for (const auto& c : cases) {
+        const std::optional<PictureFit> fit =
+            FitPictureToBox(c.picture, c.height, c.width, c.frame, c.top, c.left);
+        ASSERT_TRUE(fit) << c.what;
+        EXPECT_EQ(*fit, c.fit) << c.what;
+    }
+}
+
+TEST(FitPictureToBox, NothingToFitOrNoRoomLeft) {
+    EXPECT_FALSE(FitPictureToBox({0, 100}, 500, 500, false));
+    EXPECT_FALSE(FitPictureToBox({100, 0}, 500, 500, false));
+    EXPECT_FALSE(FitPictureToBox({}, 500, 500, false));
+    // A window smaller than its frame: an empty target at the start, no division by 0.
+    EXPECT_EQ(FitPictureToBox({100, 100}, 400, 2000, true), (PictureFit{0, 0, 0, 0}));
+    EXPECT_EQ(FitPictureToBox({100, 100}, 2000, 125, true, 5, 6), (PictureFit{5, 6, 0, 0}));
+    EXPECT_EQ(FitPictureToBox({100, 100}, 0, 0, false), (PictureFit{0, 0, 0, 0}));
+}
+
+TEST(ControlPictures, PictureNameFollowsTheLastLayoutWordInTheCaption) {
+    FakePlatform fake;
+    frmSettings w(fake.platform);
+    const std::pair<const char*, const char*> cases[] = {
+        {"Standard Control Layout", "/lum Standard.jpg"},
+        {"Paddle Control Layout", "/lum Paddles.jpg"},
+        {"Keyboard Control Layout", "/lum Keyboard.jpg"},
+        {"DRIVING", "/lum Driving.jpg"},
+        {"driving or paddle", "/lum Driving.jpg"},
+        {"keyboard standard", "/lum Keyboard.jpg"},
+        {"Joystick", ""},
+    };
+    for (const auto& [caption, name] : cases)
+        EXPECT_EQ(w.GetPicName(caption), name) << caption;
+}
+
+TEST(ControlPictures, EachPortButtonShowsItsControllersPicture) {
+    FakePlatform fake;
+    frmSettings w(fake.platform);
+    w.cmdLeftControlPic_Click(); // no picture file yet
+    EXPECT_EQ(boxLines(fake.dialogs), Lines{"Error | Error loading pic | Ok | Exclamation"});
+    EXPECT_TRUE(w.findChild<frmPicPreview*>() == nullptr ||
+                !w.findChild<frmPicPreview*>()->isVisible());
+
+    for (const char* name : {"lum Paddles.jpg", "lum Driving.jpg"}) {
+        QImage image(40, 20, QImage::Format_RGB32);
+        image.fill(Qt::darkGreen);
+        ASSERT_TRUE(image.save(fake.programFolder() + "/" + name, "JPG"));
+    }
+    w.comboLeftController->setCurrentIndex(2);  // Paddle Controller
+    w.comboRightController->setCurrentIndex(4); // Driving Controller
+    ASSERT_EQ(w.cmdLeftControlPic->text(), "Paddle Control Layout");
+    QTest::mouseClick(w.cmdLeftControlPic, Qt::LeftButton);
+    const QPointer<frmPicPreview> first = w.findChild<frmPicPreview*>();
+    ASSERT_NE(first, nullptr);
+    EXPECT_TRUE(first->isVisible());
+    EXPECT_EQ(first->windowTitle(), "Paddle Control Layout");
+    EXPECT_EQ(first->picturePath(), fake.programFolder() + "/lum Paddles.jpg");
+
+    // A click while it is open replaces picture and caption in the same window.
+    QTest::mouseClick(w.cmdRightControlPic, Qt::LeftButton);
+    EXPECT_EQ(w.findChild<frmPicPreview*>(), first.data());
+    EXPECT_EQ(first->windowTitle(), "Driving Control Layout");
+    EXPECT_EQ(first->picturePath(), fake.programFolder() + "/lum Driving.jpg");
+
+    // Closed, it is gone; the next click opens a new one.
+    first->close();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    EXPECT_TRUE(first.isNull());
+    w.cmdLeftControlPic_Click();
+    ASSERT_NE(w.findChild<frmPicPreview*>(), nullptr);
+    EXPECT_EQ(w.findChild<frmPicPreview*>()->windowTitle(), "Paddle Control Layout");
+    EXPECT_EQ(fake.dialogs.boxes.size(), 1u);
 }
