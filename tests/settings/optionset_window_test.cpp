@@ -235,25 +235,6 @@ TEST_F(OptionSet, NumberFieldsKeepTheirLeadingNumber) {
     EXPECT_EQ(target->txtFPScustom->text(), "0");
 }
 
-TEST_F(OptionSet, SoundQueueScaleFollowsTheLoadedValue) {
-    const QByteArray start = initialBytes();
-    // {stored, loads, the bar as "min max text"}
-    for (const auto& [stored, ok, bar] : {std::tuple{50.0f, true, "-100 100 50"},
-                                          {12345.0f, true, "12200 12400 12,345"},
-                                          {5.0f, false, "4500 4700 4,608"}}) {
-        QByteArray bytes = start;
-        putSingle(bytes, 54, stored);
-        putInt16(bytes, 52, 1); // chkQuiet, applied just before the sound queue
-        auto w = open();
-        EXPECT_EQ(loadBytes(*w, bytes), ok) << stored;
-        const vbalProgressBar* queue = w->BarColorSoundQueue;
-        EXPECT_EQ(QStringLiteral("%1 %2 %3").arg(queue->Min()).arg(queue->Max()).arg(queue->Text()),
-                  bar);
-        EXPECT_EQ(w->chkQuiet->checkState(), Qt::Checked) << stored;
-    }
-    EXPECT_EQ(fake.dialogs.boxes.size(), 1u);
-}
-
 TEST_F(OptionSet, ABadFieldStopsTheLoadWithWhatCameBeforeApplied) {
     QByteArray bytes = initialBytes();
     for (const auto& [offset, value] : {std::pair<int, qint16>{0, 3}, // video mode
