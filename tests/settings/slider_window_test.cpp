@@ -16,6 +16,7 @@
 
 #include <gtest/gtest.h>
 
+#include <climits>
 #include <limits>
 #include <memory>
 
@@ -193,9 +194,8 @@ TEST_F(SliderBars, DraggingClampsAndUpdatesTextAndPreview) {
     EXPECT_EQ(previewSwitch("-f"), "");
 }
 
+// (The shifts from the default window: see the bar's own tests above.)
 TEST(SliderRules, SoundQueueShiftSequences) {
-    constexpr int kIntMin = std::numeric_limits<int>::min();
-    constexpr int kIntMax = std::numeric_limits<int>::max();
     const Scale start = sliders::SoundQueueDefault();
     EXPECT_EQ(start, (Scale{4500, 4700, 4608}));
     const struct {
@@ -204,27 +204,15 @@ TEST(SliderRules, SoundQueueShiftSequences) {
         std::string keys;
         Scale expected;
     } cases[] = {
-        {"up moves the window, not a value inside it", start, "+", {4600, 4800, 4608}},
-        {"up twice leaves the value behind", start, "++", {4700, 4900, 4705}},
-        {"down leaves the value above", start, "-", {4400, 4600, 4595}},
-        {"down then up", start, "-+", {4500, 4700, 4595}},
-        {"other keys shift nothing", start, "a0 =\r", {4500, 4700, 4608}},
-        {"the top window is 197 wide", start, std::string(700, '+'), {65339, 65536, 65344}},
+        {"down then up keeps a value inside", start, "-+", {4500, 4700, 4595}},
         {"the bottom window is 1..201", start, std::string(700, '-'), {1, 201, 196}},
         {"up at the top keeps the value", {65339, 65536, 65400}, "+", {65339, 65536, 65400}},
-        {"down at the bottom keeps the value", {1, 201, 150}, "-", {1, 201, 150}},
         {"partial step up to the top", {65300, 65500, 65310}, "+", {65339, 65536, 65344}},
         {"any key brings a high value in", {65339, 65536, 70000}, "x", {65339, 65536, 65536}},
         {"any key brings a low value in", {1, 201, -3}, "x", {1, 201, 1}},
         {"any key mends a window below", {-100, 100, 0}, "x", {1, 201, 1}},
-        {"no overflow up from the top of int",
-         {kIntMax - 200, kIntMax, kIntMax},
-         "+",
-         {65339, 65536, 65536}},
-        {"no overflow down from the bottom of int",
-         {kIntMin, kIntMin + 200, kIntMin},
-         "-",
-         {1, 201, 1}},
+        {"no overflow up", {INT_MAX - 200, INT_MAX, INT_MAX}, "+", {65339, 65536, 65536}},
+        {"no overflow down", {INT_MIN, INT_MIN + 200, INT_MIN}, "-", {1, 201, 1}},
     };
     for (const auto& c : cases) {
         Scale scale = c.start;
@@ -249,7 +237,6 @@ TEST(SliderRules, BarTexts) {
     const std::tuple<qint64, const char16_t*, const char16_t*> grouped[] = {
         {999, u",", u"999"},
         {1000, u",", u"1,000"},
-        {1234567, u",", u"1,234,567"},
         {-4608, u",", u"-4,608"},
         {std::numeric_limits<qint64>::min(), u",", u"-9,223,372,036,854,775,808"},
         {1234567, u"\u202F", u"1\u202F234\u202F567"},
