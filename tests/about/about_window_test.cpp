@@ -73,24 +73,18 @@ TEST(AboutRulesTest, ShrinkTilesAndLinks) {
 }
 
 TEST_F(AboutWindowTest, GetKeyValue) {
-    const std::pair<QByteArray, const char*> numbers[] = {
-        {QByteArray("\x78\x56\x34\x12", 4), "&h12345678"}, // last byte first
-        {QByteArray("\x0F\x0A\x00\x00", 4), "&hA0F"},      // inner zeros kept
+    const std::pair<RegistryValue, std::optional<QString>> values[] = {
+        {{kRegNumber, QByteArray("\x78\x56\x34\x12", 4)}, "&h12345678"}, // last byte first
+        {{kRegNumber, QByteArray("\x0F\x0A\x00\x00", 4)}, "&hA0F"},      // inner zeros kept
+        {{kRegString, QByteArray("/usr/bin/hardinfo\0junk", 22)}, "/usr/bin/hardinfo"},
+        {{3, QByteArray("\x01", 1)}, std::nullopt}, // no text form
     };
-    for (const auto& [bytes, text] : numbers) {
-        fake.registry.set(kHkeyLocalMachine, kMsinfoKey, text, {kRegNumber, bytes});
-        QString value;
-        EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, text, value));
-        EXPECT_EQ(value, QLatin1String(text));
-    }
-    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "PATH",
-                      {kRegString, QByteArray("/usr/bin/hardinfo\0junk", 22)});
-    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "Blob", {3, QByteArray("\x01", 1)});
+    for (const auto& [value, text] : values)
+        EXPECT_EQ(registryValueText(value), text) << value.data.toHex().constData();
+    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "Blob", values[3].first);
     QString value = QStringLiteral("before");
     EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, "Blob", value));
-    EXPECT_EQ(value, "before"); // no text form: left alone
-    EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, "PATH", value));
-    EXPECT_EQ(value, "/usr/bin/hardinfo"); // cut at the NUL
+    EXPECT_EQ(value, "before"); // left alone
     EXPECT_FALSE(window->GetKeyValue(0x80000001u, kMsinfoKey, "PATH", value));
     EXPECT_EQ(value, "");
 }
