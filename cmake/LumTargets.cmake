@@ -45,6 +45,10 @@ function(lum_test_folder name)
     add_executable(test_${name} ${sources})
     set_target_properties(test_${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
     target_link_libraries(test_${name} PRIVATE lum_testsupport ${ARG_DEPS} GTest::gtest)
+    # Every test file sees the same printers for Qt's strings: readable failures, and one
+    # definition of each printer across the program.
+    target_compile_options(test_${name} PRIVATE
+        "SHELL:-include ${PROJECT_SOURCE_DIR}/tests/support/QtPrinters.h")
     lum_rerun_moc_on_new_files(test_${name} "${sources}")
     gtest_discover_tests(test_${name}
         PROPERTIES ENVIRONMENT "QT_QPA_PLATFORM=offscreen;LUM_SOURCE_DIR=${PROJECT_SOURCE_DIR}"

@@ -4,13 +4,13 @@
 #include <QString>
 #include <QStringList>
 #include <QTcpServer>
+#include <QTcpSocket>
 
 #include <map>
-
-class QTcpSocket;
+#include <memory>
 
 // A tiny HTTP server on 127.0.0.1 for the download tests. It runs in the test's own
-// thread: the downloader's waiting loop serves it.
+// thread: the downloader's waiting loop serves it. Paths it was not told about get 404.
 class LocalHttpServer {
 public:
     struct Response {
@@ -23,10 +23,28 @@ public:
         qsizetype claimedLength = -1;
     };
 
-    LocalHttpServer();
+    LocalHttpServer() {
+        m_server.listen(QHostAddress::LocalHost);
+        QObject::connect(&m_server, &QTcpServer::newConnection, &m_server, [this] {
+            while (QTcpSocket* socket = m_server.nextPendingConnection()) {
+                auto received = std::make_shared<QByteArray>();
+                QObject::connect(socket, &QTcpSocket::disconnected, socket, &QObject::deleteLater);
+                QObject::connect(socket, &QTcpSocket::readyRead, socket, [=, this] {
+                    *received += socket->readAll();
+                    const qsizetype end = received->indexOf("\r\n\r\n");
+                    if (end >= 0) {
+                        answer(socket, received->left(end));
+                        received->remove(0, end + 4);
+                    }
+                });
+            }
+        });
+    }
 
     // "http://127.0.0.1:<port>".
-    QString base() const;
+    QString base() const {
+        return QStringLiteral("http://127.0.0.1:%1").arg(m_server.serverPort());
+    }
     void serve(const QString& path, const QByteArray& body) {
         responses[path] = {200, body, {}, false};
     }
@@ -41,15 +59,36 @@ public:
     }
 
     // An address on which nothing listens, so connecting is refused.
-    static QString refusedBase();
+    static QString refusedBase() {
+        QTcpServer probe;
+        probe.listen(QHostAddress::LocalHost);
+        return QStringLiteral("http://127.0.0.1:%1").arg(probe.serverPort());
+    }
 
-    // Paths not listed here are answered with 404.
     std::map<QString, Response> responses;
     // The paths of all requests, in order.
     QStringList requests;
 
 private:
-    void answer(QTcpSocket* socket, const QByteArray& request);
+    void answer(QTcpSocket* socket, const QByteArray& request) {
+        const QList<QByteArray> words = request.left(request.indexOf("\r\n")).split(' ');
+        const QString path = words.size() > 1 ? QString::fromUtf8(words[1]) : QString();
+        requests << path;
+        const auto found = responses.find(path);
+        const Response response =
+            found != responses.end() ? found->second : Response{404, "none", {}, false, -1};
+        if (response.silent)
+            return;
+        const qsizetype length =
+            response.claimedLength >= 0 ? response.claimedLength : response.body.size();
+        QByteArray reply = "HTTP/1.1 " + QByteArray::number(response.status) + " Status\r\n" +
+                           "Content-Type: application/octet-stream\r\nContent-Length: " +
+                           QByteArray::number(length) + "\r\n";
+        if (!response.location.isEmpty())
+            reply += "Location: " + response.location + "\r\n";
+        socket->write(reply + "Connection: close\r\n\r\n" + response.body);
+        socket->disconnectFromHost();
+    }
 
     QTcpServer m_server;
 };

@@ -1,5 +1,5 @@
 #include "LocalHttpServer.h"
-#include "support/FakePlatform.h"
+#include "support/Boxes.h"
 
 #include "about/AboutArt.h"
 #include "about/AboutRules.h"
@@ -23,8 +23,7 @@
 namespace {
 
 const QString kProduct = QStringLiteral("lum (Windows Front End for z26)");
-const QString kMsinfoKey = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools\\MSINFO");
-const QString kLocationKey = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools Location");
+const QString kMsinfoKey = QString::fromLatin1(kSysInfoPathKey);
 
 QColor textColour(const QLabel* label) {
     return label->palette().color(QPalette::WindowText);
@@ -49,7 +48,7 @@ TEST(AboutRulesTest, ShrinkTilesAndLinks) {
     QFont font(QStringLiteral("Arial"));
     font.setBold(true);
     font.setPointSizeF(29.25);
-    const auto width = [&](double points) {
+    auto width = [font](double points) mutable {
         font.setPointSizeF(points);
         return QFontMetrics(font).horizontalAdvance(kProduct);
     };
@@ -57,14 +56,13 @@ TEST(AboutRulesTest, ShrinkTilesAndLinks) {
     EXPECT_DOUBLE_EQ(fitted - std::floor(fitted), 0.25); // whole points off 29.25
     EXPECT_LE(width(fitted), 327);
     EXPECT_GT(width(fitted + 1), 327);
-    font.setPointSizeF(29.25);
     EXPECT_DOUBLE_EQ(shrinkToFit(font, QStringLiteral("lum"), 327), 29.25);
     EXPECT_DOUBLE_EQ(shrinkToFit(font, kProduct, 0), 1.0); // stops instead of looping
 
-    const std::vector<QPoint> columnByColumn = {{0, 0},    {0, 96},  {128, 0},
-                                                {128, 96}, {256, 0}, {256, 96}};
-    EXPECT_EQ(tileOrigins(QSize(300, 100), QSize(128, 96)), columnByColumn);
-    EXPECT_EQ(tileOrigins(QSize(256, 96), QSize(128, 96)).size(), 6u); // bounds inclusive
+    // Column by column, both bounds inclusive.
+    EXPECT_EQ(tileOrigins(QSize(300, 100), QSize(128, 96)),
+              (std::vector<QPoint>{{0, 0}, {0, 96}, {128, 0}, {128, 96}, {256, 0}, {256, 96}}));
+    EXPECT_EQ(tileOrigins(QSize(256, 96), QSize(128, 96)).size(), 6u);
     EXPECT_TRUE(tileOrigins(QSize(300, 100), QSize(0, 96)).empty());
 
     EXPECT_EQ(mailtoAddress("me@example.org", kProduct, "1.1.12"),
@@ -75,25 +73,18 @@ TEST(AboutRulesTest, ShrinkTilesAndLinks) {
 }
 
 TEST_F(AboutWindowTest, GetKeyValue) {
-    const std::pair<QByteArray, const char*> numbers[] = {
-        {QByteArray("\x78\x56\x34\x12", 4), "&h12345678"}, // last byte first
-        {QByteArray("\x0F\x0A\x00\x00", 4), "&hA0F"},      // inner zeros kept
-        {QByteArray("\x00\x00\x00\x00", 4), "&h0"},
+    const std::pair<RegistryValue, std::optional<QString>> values[] = {
+        {{kRegNumber, QByteArray("\x78\x56\x34\x12", 4)}, "&h12345678"}, // last byte first
+        {{kRegNumber, QByteArray("\x0F\x0A\x00\x00", 4)}, "&hA0F"},      // inner zeros kept
+        {{kRegString, QByteArray("/usr/bin/hardinfo\0junk", 22)}, "/usr/bin/hardinfo"},
+        {{3, QByteArray("\x01", 1)}, std::nullopt}, // no text form
     };
-    for (const auto& [bytes, text] : numbers) {
-        fake.registry.set(kHkeyLocalMachine, kMsinfoKey, text, {kRegNumber, bytes});
-        QString value;
-        EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, text, value));
-        EXPECT_EQ(value, QLatin1String(text));
-    }
-    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "PATH",
-                      {kRegString, QByteArray("/usr/bin/hardinfo\0junk", 22)});
-    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "Blob", {3, QByteArray("\x01", 1)});
+    for (const auto& [value, text] : values)
+        EXPECT_EQ(registryValueText(value), text) << value.data.toHex().constData();
+    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "Blob", values[3].first);
     QString value = QStringLiteral("before");
     EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, "Blob", value));
-    EXPECT_EQ(value, "before"); // no text form: left alone
-    EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, "PATH", value));
-    EXPECT_EQ(value, "/usr/bin/hardinfo"); // cut at the NUL
+    EXPECT_EQ(value, "before"); // left alone
     EXPECT_FALSE(window->GetKeyValue(0x80000001u, kMsinfoKey, "PATH", value));
     EXPECT_EQ(value, "");
 }
@@ -116,25 +107,23 @@ TEST_F(AboutWindowTest, SystemInformation) {
             fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "PATH",
                               {kRegString, "/usr/bin/hardinfo"});
         if (location)
-            fake.registry.set(kHkeyLocalMachine, kLocationKey, "MSINFO",
+            fake.registry.set(kHkeyLocalMachine, QString::fromLatin1(kSysInfoFolderKey), "MSINFO",
                               {kRegString, folder.toUtf8() + '\0'});
         if (there)
             fake.writeFile("msinfo/MSINFO32.EXE");
-
         QTest::mouseClick(window->cmdSysInfo, Qt::LeftButton);
         if (started) {
             ASSERT_EQ(fake.shell.started.size(), 1u);
             EXPECT_TRUE(fake.shell.started[0].program.endsWith(QLatin1String(started)));
-            EXPECT_TRUE(fake.dialogs.boxes.empty());
-        } else {
-            ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
-            EXPECT_EQ(fake.dialogs.boxes[0].text, "System Information Is Unavailable At This Time");
-            EXPECT_EQ(fake.dialogs.boxes[0].title, "lum");
         }
+        EXPECT_EQ(boxLines(fake.dialogs),
+                  started
+                      ? Lines{}
+                      : Lines{"lum | System Information Is Unavailable At This Time | Ok | None"});
     }
 }
 
-TEST_F(AboutWindowTest, LoadsNameVersionAndColours) {
+TEST_F(AboutWindowTest, LoadsNameVersionColoursAndTiledBackground) {
     EXPECT_EQ(window->lblProgram->text(), kProduct);
     EXPECT_EQ(window->lblVersion->text(), "Version 1.1.12");
     EXPECT_LT(window->lblProgram->font().pointSizeF(), 29.25);
@@ -144,9 +133,7 @@ TEST_F(AboutWindowTest, LoadsNameVersionAndColours) {
     EXPECT_EQ(textColour(window->lblCorwen), QColor(0, 255, 0));
     EXPECT_EQ(textColour(window->lblMain), QColor(255, 255, 0));
     EXPECT_EQ(textColour(window->lblEmail), QColor(0, 255, 255));
-}
 
-TEST_F(AboutWindowTest, BackgroundIsTiledOverTheWholeWindow) {
     window->show();
     const QImage shot = window->grab().toImage().convertToFormat(QImage::Format_RGB32);
     const QImage tile = aboutBackgroundTile();
@@ -169,9 +156,9 @@ TEST_F(AboutWindowTest, EmailHoverAndLinks) {
     moveMouse(window, QPoint(2, 2)); // the window's own surface
     EXPECT_EQ(textColour(window->lblEmail), QColor(0, 255, 255));
 
-    QTest::mouseClick(window->lblEmail, Qt::LeftButton);
-    QTest::mouseClick(window->cmdWeb, Qt::LeftButton);
-    QTest::mouseClick(window->cmdDonate, Qt::LeftButton);
+    for (QWidget* link :
+         std::initializer_list<QWidget*>{window->lblEmail, window->cmdWeb, window->cmdDonate})
+        QTest::mouseClick(link, Qt::LeftButton);
     ASSERT_EQ(fake.shell.urls.size(), 3);
     EXPECT_TRUE(fake.shell.urls[0].startsWith("mailto:"));
     EXPECT_TRUE(fake.shell.urls[0].endsWith(" v1.1.12 Question"));
@@ -180,34 +167,27 @@ TEST_F(AboutWindowTest, EmailHoverAndLinks) {
     EXPECT_TRUE(fake.shell.urls[2].contains("/xclick/business="));
 }
 
-TEST_F(AboutWindowTest, ForumThenUpdate) {
-    server.serve("/programs/update.txt", "::lum (Windows Front End for z26)\r\n"
-                                         "https://example.org/forum/lum\r\n"
-                                         "1049612\r\nJune 2nd\r\nu\r\nn\r\n0\r\n");
+TEST_F(AboutWindowTest, ForumThenUpdateAndAnInstallerThatEndsTheProgram) {
+    server.serve("/programs/update.txt",
+                 "::lum (Windows Front End for z26)\r\nhttps://example.org/forum/lum\r\n"
+                 "1049613\r\nJune 2nd\r\n" +
+                     server.base().toUtf8() + "/setup.run\r\nsetup.run\r\n1\r\n");
+    server.serve("/setup.run", "INSTALLER");
     QTest::mouseClick(window->cmdForum, Qt::LeftButton);
     EXPECT_EQ(fake.shell.urls, QStringList{"https://example.org/forum/lum"});
     EXPECT_FALSE(window->m_bForumRequest);
+
+    QSignalSpy ended(window.data(), &frmAbout::endProgramRequested);
     QTest::mouseClick(window->cmdUpdate, Qt::LeftButton);
-    ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(fake.dialogs.boxes[0].title, "No update needed");
+    EXPECT_EQ(ended.count(), 1);
+    EXPECT_EQ(fake.shell.started.size(), 1u);
+    EXPECT_FALSE(QFileInfo::exists(fake.iniPath())); // nothing saved
+
     // A failed forum lookup clears the request too.
     server.fail("/programs/update.txt", 404);
     QTest::mouseClick(window->cmdForum, Qt::LeftButton);
     EXPECT_FALSE(window->m_bForumRequest);
     EXPECT_EQ(fake.shell.urls.size(), 1);
-}
-
-TEST_F(AboutWindowTest, StartedInstallerEndsTheProgramWithoutSaving) {
-    server.serve("/programs/update.txt", "::lum (Windows Front End for z26)\r\nf\r\n"
-                                         "1049613\r\nJune 2nd\r\n" +
-                                             server.base().toUtf8() +
-                                             "/setup.run\r\nsetup.run\r\n1\r\n");
-    server.serve("/setup.run", "INSTALLER");
-    QSignalSpy ended(window.data(), &frmAbout::endProgramRequested);
-    QTest::mouseClick(window->cmdUpdate, Qt::LeftButton);
-    EXPECT_EQ(ended.count(), 1);
-    EXPECT_EQ(fake.shell.started.size(), 1u);
-    EXPECT_FALSE(QFileInfo::exists(fake.iniPath()));
 }
 
 TEST_F(AboutWindowTest, StaysOpenWhileADownloadWaits) {

@@ -1,11 +1,15 @@
 #include "LocalHttpServer.h"
-#include "support/FakePlatform.h"
+#include "support/Boxes.h"
 
 #include "about/UpdateCheck.h"
+#include "platform/Downloader.h"
+#include "platform/Registry.h"
 
 #include <QDir>
+#include <QElapsedTimer>
 #include <QFile>
 #include <QFileInfo>
+#include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
@@ -13,10 +17,19 @@ namespace {
 
 const QString kDescription = QStringLiteral("/programs/update.txt");
 const QString kInstaller = QStringLiteral("/files/setup.run");
+const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
+const std::string kAsk = "Update available | Version 1.1.13 released June 2nd is available.\n\n"
+                         "Do you wish to update now? | YesNoCancel | None";
 
 QByteArray readAll(const QString& path) {
     QFile file(path);
     return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
+}
+
+void writeFile(const QString& path, const QByteArray& content) {
+    QFile file(path);
+    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    file.write(content);
 }
 
 class UpdateCheckTest : public ::testing::Test {
@@ -27,121 +40,87 @@ protected:
     // A description file with this product's section after another product's.
     void describe(qint64 version, const QByteArray& fileName = "setup.run",
                   const QByteArray& runFlag = "0", const QByteArray& messages = {}) {
-        server.serve(kDescription, "::Other\r\nhttps://other.example/forum\r\n9999999\r\n"
-                                   "::lum (Windows Front End for z26)\r\n"
-                                   "https://example.org/forum/lum\r\n" +
-                                       messages + QByteArray::number(version) + "\r\nJune 2nd\r\n" +
+        server.serve(kDescription, "::Other\r\nhttps://other.example/forum\r\n9999999\r\n" +
+                                       kHeader + "https://example.org/forum/lum\r\n" + messages +
+                                       QByteArray::number(version) + "\r\nJune 2nd\r\n" +
                                        server.base().toUtf8() + kInstaller.toUtf8() + "\r\n" +
                                        fileName + "\r\n" + runFlag + "\r\n");
         server.serve(kInstaller, "INSTALLER");
     }
 
-    UpdateCheck::Outcome run(bool forum, Platform* platform = nullptr, QString base = {}) {
-        UpdateCheck check(platform ? *platform : fake.platform, nullptr,
-                          base.isEmpty() ? server.base() : base);
-        return check.Run(forum);
+    UpdateCheck::Outcome run(bool forum) {
+        return UpdateCheck(fake.platform, nullptr, server.base()).Run(forum);
+    }
+
+    // The boxes shown since the last call.
+    Lines takeBoxes() {
+        Lines lines = boxLines(fake.dialogs);
+        fake.dialogs.boxes.clear();
+        return lines;
     }
 
     QString updateFolder() const { return fake.programFolder() + "/Update"; }
     QString installerPath() const { return updateFolder() + "/setup.run"; }
-
-    // The titles of the boxes shown, in order; forgets them.
-    QStringList takeTitles() {
-        QStringList titles;
-        for (const auto& box : fake.dialogs.boxes)
-            titles << box.title;
-        fake.dialogs.boxes.clear();
-        return titles;
-    }
 };
 
-TEST_F(UpdateCheckTest, NoSectionForThisProduct) {
-    server.serve(kDescription, "::lum (windows front end for z26)\r\nhttps://x/f\r\n1\r\n");
-    EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
-    ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(fake.dialogs.boxes[0].text, "No Updates Found");
-    EXPECT_EQ(fake.dialogs.boxes[0].title, "No updates available");
-    EXPECT_EQ(fake.dialogs.boxes[0].icon, MsgIcon::None);
-    // The local copy stays in the program folder.
-    EXPECT_TRUE(readAll(fake.programFolder() + "/tmp").startsWith("::lum (windows"));
-
-    takeTitles();
-    run(true);
-    EXPECT_EQ(fake.shell.urls, QStringList{server.base() + "/forum"});
-    EXPECT_TRUE(fake.dialogs.boxes.empty());
-}
-
-TEST_F(UpdateCheckTest, ForumModeOpensTheSectionsForumPage) {
+TEST_F(UpdateCheckTest, ForumModeOpensTheSectionsWebPageOnly) {
     describe(1049613);
     run(true);
     // Something other than a web page is not opened; the general forum stands in.
-    server.serve(kDescription,
-                 "::lum (Windows Front End for z26)\r\nfile:///etc/passwd\r\n1049613\r\n");
+    server.serve(kDescription, kHeader + "file:///etc/passwd\r\n1049613\r\n");
     run(true);
     EXPECT_EQ(fake.shell.urls,
               (QStringList{"https://example.org/forum/lum", server.base() + "/forum"}));
-    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_TRUE(takeBoxes().empty());
     EXPECT_FALSE(server.requests.contains(kInstaller));
 }
 
-TEST_F(UpdateCheckTest, SameOrOlderVersionOnTheServer) {
-    const QString huh = QStringLiteral(
-        "Huh, that's odd... \nThis Version is newer that what's available\non the internet.");
+TEST_F(UpdateCheckTest, VersionsAreComparedAndOnlyYesDownloads) {
     describe(1049612, "setup.run", "0", "'Hello\r\n'World\r\n");
     run(false);
-    ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
-    EXPECT_EQ(fake.dialogs.boxes[0].title, "Update Message");
-    EXPECT_EQ(fake.dialogs.boxes[0].text, "\nHello\nWorld\n");
-    EXPECT_EQ(fake.dialogs.boxes[0].icon, MsgIcon::Information);
-    EXPECT_EQ(fake.dialogs.boxes[1].title, "No update needed");
-    EXPECT_EQ(fake.dialogs.boxes[1].text,
-              "You have the current version 1.1.12 Released June 2nd\nNo update is needed");
-    EXPECT_EQ(fake.dialogs.boxes[1].icon, MsgIcon::None);
-
-    takeTitles();
-    describe(1049611);
-    run(false);
-    ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(fake.dialogs.boxes[0].title, "No update needed");
-    EXPECT_EQ(fake.dialogs.boxes[0].text, huh);
-    EXPECT_FALSE(server.requests.contains(kInstaller));
-}
-
-TEST_F(UpdateCheckTest, NoOrCancelDownloadsNothing) {
-    const std::tuple<qint64, const char*, MsgResult> cases[] = {
-        {1049613, "1.1.13", MsgResult::No}, {2098176, "2.1.0", MsgResult::Cancel}};
-    for (const auto& [available, version, answer] : cases) {
-        fake.dialogs.answers = {answer};
-        describe(available);
+    EXPECT_EQ(takeBoxes(), (Lines{"Update Message | \nHello\nWorld\n | Ok | Information",
+                                  "No update needed | You have the current version 1.1.12 "
+                                  "Released June 2nd\nNo update is needed | Ok | None"}));
+    const struct {
+        qint64 available;
+        MsgResult answer;
+        std::string box;
+    } cases[] = {{1049611, MsgResult::Ok,
+                  "No update needed | Huh, that's odd... \nThis Version is newer that what's "
+                  "available\non the internet. | Ok | None"},
+                 {1049613, MsgResult::No, kAsk},
+                 {2098176, MsgResult::Cancel,
+                  "Update available | Version 2.1.0 released June 2nd is available.\n\n"
+                  "Do you wish to update now? | YesNoCancel | None"}};
+    for (const auto& c : cases) {
+        fake.dialogs.answers = {c.answer};
+        describe(c.available);
         run(false);
-        ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
-        EXPECT_EQ(fake.dialogs.boxes[0].title, "Update available");
-        EXPECT_EQ(fake.dialogs.boxes[0].text,
-                  QStringLiteral("Version %1 released June 2nd is available.\n\n"
-                                 "Do you wish to update now?")
-                      .arg(QLatin1String(version)));
-        EXPECT_EQ(fake.dialogs.boxes[0].buttons, MsgButtons::YesNoCancel);
-        takeTitles();
+        EXPECT_EQ(takeBoxes(), Lines{c.box}) << c.available;
     }
     EXPECT_FALSE(server.requests.contains(kInstaller));
     EXPECT_FALSE(QFileInfo::exists(updateFolder()));
+    // The local copy of the description stays in the program folder.
+    EXPECT_TRUE(readAll(fake.programFolder() + "/tmp").startsWith("::Other"));
 }
 
-TEST_F(UpdateCheckTest, DownloadAndKeep) {
-    describe(1049613, "setup.run", "0");
-    QDir().mkpath(updateFolder());
-    QFile old(installerPath()); // an older installer of the same name is replaced
-    ASSERT_TRUE(old.open(QIODevice::WriteOnly));
-    old.write("OLD");
-    old.close();
+TEST_F(UpdateCheckTest, DownloadAndKeepReplacingAnOlderInstaller) {
+    describe(1049613);
+    server.fail(kInstaller, 404);
+    run(false);
+    EXPECT_EQ(takeBoxes(),
+              (Lines{kAsk, "Download Failed | Failed to Download Update | Ok | None"}));
+    EXPECT_TRUE(QFileInfo(updateFolder()).isDir()); // made for the download, and kept
+    EXPECT_FALSE(QFileInfo::exists(installerPath()));
 
+    fake.writeFile("program/Update/setup.run", "OLD");
+    server.serve(kInstaller, "INSTALLER");
     EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
     EXPECT_EQ(readAll(installerPath()), "INSTALLER");
-    ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
-    EXPECT_EQ(fake.dialogs.boxes[1].title, "Download Complete");
-    EXPECT_EQ(fake.dialogs.boxes[1].text, "The update has been downloaded to " +
-                                              QDir::toNativeSeparators(installerPath()) + "\n");
-    EXPECT_EQ(fake.dialogs.boxes[1].icon, MsgIcon::Information);
+    EXPECT_EQ(takeBoxes(),
+              (Lines{kAsk, "Download Complete | The update has been downloaded to " +
+                               QDir::toNativeSeparators(installerPath()).toStdString() +
+                               "\n | Ok | Information"}));
     // The folder window shows the program folder, not Update.
     EXPECT_EQ(fake.shell.folders, QStringList{fake.programFolder()});
     EXPECT_TRUE(fake.shell.started.empty());
@@ -156,61 +135,95 @@ TEST_F(UpdateCheckTest, DownloadAndRunEndsTheProgram) {
     EXPECT_EQ(fake.shell.started[0].arguments,
               (QStringList{"/SP-", "/silent", "/noicons",
                            "/dir=" + QDir::toNativeSeparators(fake.programFolder())}));
-    EXPECT_EQ(takeTitles(), QStringList{"Update available"});
+    EXPECT_EQ(takeBoxes(), Lines{kAsk});
     EXPECT_TRUE(fake.shell.folders.empty());
 
     // An installer that will not start leaves the program running and says where it is.
     fake.shell.succeed = false;
     EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
-    EXPECT_EQ(takeTitles(), (QStringList{"Update available", "Download Complete"}));
+    EXPECT_EQ(takeBoxes().size(), 2u); // asked, then told where the installer is
+    EXPECT_EQ(fake.shell.folders, QStringList{fake.programFolder()});
 }
 
-TEST_F(UpdateCheckTest, InstallerMissingOnTheServer) {
-    describe(1049613);
-    server.fail(kInstaller, 404);
-    run(false);
-    EXPECT_EQ(takeTitles(), (QStringList{"Update available", "Download Failed"}));
-    EXPECT_TRUE(QFileInfo(updateFolder()).isDir());
-    EXPECT_FALSE(QFileInfo::exists(installerPath()));
-}
-
-TEST_F(UpdateCheckTest, DescriptionUnreachable) {
-    QtDownloader impatient{std::chrono::milliseconds(300)};
-    Platform shortTimeout{fake.store,           fake.dialogs, fake.shell,
-                          fake.programFolder(), impatient,    fake.registry};
+TEST_F(UpdateCheckTest, AnUnreachableDescriptionIsAFailedCheckInBothModes) {
     server.fail(kDescription, 404);
     run(false);
     run(true);
-    run(false, nullptr, LocalHttpServer::refusedBase());
-    server.stall(kDescription);
-    run(false, &shortTimeout);
-    ASSERT_EQ(fake.dialogs.boxes.size(), 4u);
-    for (const auto& box : fake.dialogs.boxes) {
-        EXPECT_EQ(box.title, "Update Check Failed");
-        EXPECT_EQ(box.text, "Failed to connect to the internet");
-        EXPECT_EQ(box.icon, MsgIcon::Information);
-    }
+    EXPECT_EQ(takeBoxes(),
+              Lines(2, "Update Check Failed | Failed to connect to the internet | Ok | "
+                       "Information"));
     EXPECT_TRUE(fake.shell.urls.empty());
     EXPECT_FALSE(QFileInfo::exists(fake.programFolder() + "/tmp"));
 }
 
-// Unsafe installer names and broken sections are failed checks: nothing is asked or fetched.
-TEST_F(UpdateCheckTest, UnsafeNamesAndBrokenSections) {
-    for (const char* name : {"../evil.run", "/tmp/evil.run", "sub/evil.run", "", ".."}) {
+// An installer name that leads out of the Update folder is a failed check: nothing is asked
+// or fetched. (Broken sections are failed checks too: see bad_input_test.cpp.)
+TEST_F(UpdateCheckTest, UnsafeInstallerNames) {
+    for (const char* name : {"../evil.run", "/tmp/evil.run", ""}) {
         describe(1049613, name);
         run(false);
-        EXPECT_EQ(takeTitles(), QStringList{"Update Check Failed"}) << name;
-    }
-    const QByteArray header = "::lum (Windows Front End for z26)\r\nhttps://f\r\n";
-    for (const QByteArray& file : {header + "1.1.13\r\ndate\r\nurl\r\nname\r\n0\r\n",
-                                   header + "1049613\r\ndate\r\n", header + "'note\r\n"}) {
-        server.serve(kDescription, file);
-        run(false);
-        EXPECT_EQ(takeTitles(), QStringList{"Update Check Failed"}) << file.constData();
+        const Lines boxes = takeBoxes();
+        ASSERT_EQ(boxes.size(), 1u) << name;
+        EXPECT_TRUE(boxes[0].starts_with("Update Check Failed | ")) << boxes[0];
     }
     EXPECT_FALSE(server.requests.contains(kInstaller));
     EXPECT_FALSE(QFileInfo::exists(updateFolder()));
     EXPECT_FALSE(QFileInfo::exists(fake.root() + "/evil.run"));
+}
+
+// The seams the check downloads and finds the system information tool through.
+
+// A success replaces the older file with the whole body, after redirects. Every failure
+// returns false, in bounded time, and leaves the older file exactly as it was, with no
+// temporary file beside it.
+TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
+    QTemporaryDir dir;
+    LocalHttpServer server;
+    QtDownloader patient, downloader{std::chrono::milliseconds(300)};
+    const QString target = dir.path() + "/file.bin";
+    const QByteArray body(300000, 'x'); // several network reads
+    server.redirect("/old", server.base() + "/new");
+    server.serve("/new", body);
+    writeFile(target, "older");
+    EXPECT_TRUE(patient.DownloadFile(server.base() + "/old", target));
+    EXPECT_EQ(readAll(target), body);
+    EXPECT_EQ(server.requests, (QStringList{"/old", "/new"}));
+    EXPECT_FALSE(downloader.DownloadFile(server.base() + "/new", dir.path() + "/no/such/file"));
+
+    server.fail("/broken", 500);
+    server.stall("/silent");
+    for (const QString& url : {server.base() + "/gone", server.base() + "/broken",
+                               server.base() + "/silent", LocalHttpServer::refusedBase() + "/any",
+                               QStringLiteral("file:///etc/hostname"), QString()}) {
+        writeFile(target, "older");
+        QElapsedTimer clock;
+        clock.start();
+        EXPECT_FALSE(downloader.DownloadFile(url, target)) << url.toStdString();
+        EXPECT_LT(clock.elapsed(), 10000);
+        EXPECT_EQ(readAll(target), "older");
+        EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files), QStringList{"file.bin"});
+    }
+}
+
+TEST(ToolRegistryTest, AnswersTheToolLookupFromPathOnly) {
+    QTemporaryDir bin;
+    const QByteArray savedPath = qgetenv("PATH");
+    qputenv("PATH", bin.path().toUtf8());
+    ToolRegistry registry;
+    const QString key = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools\\MSINFO");
+    EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine, key, "PATH"));
+    for (const char* tool : {"gnome-system-monitor", "hardinfo"}) {
+        writeFile(bin.path() + u'/' + tool, "#!/bin/sh\n");
+        QFile::setPermissions(bin.path() + u'/' + tool, QFile::ReadOwner | QFile::ExeOwner);
+    }
+    const auto value = registry.QueryValue(kHkeyLocalMachine, key, "PATH");
+    ASSERT_TRUE(value);
+    EXPECT_EQ(value->type, kRegString);
+    EXPECT_EQ(value->data, (bin.path() + "/hardinfo").toUtf8() + '\0'); // best tool first
+    EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine,
+                                     "SOFTWARE\\Microsoft\\Shared Tools Location", "MSINFO"));
+    EXPECT_FALSE(registry.QueryValue(0x80000001u, key, "PATH"));
+    qputenv("PATH", savedPath);
 }
 
 } // namespace

@@ -4,8 +4,6 @@
 
 #include "support/FakePlatform.h"
 
-#include "QtPrinters.h"
-
 #include "settings/SliderRules.h"
 #include "settings/frmSettings.h"
 #include "ui/vbalProgressBar.h"
@@ -29,50 +27,36 @@ QString dataFolder() {
     return QDir::cleanPath(QFileInfo(QStringLiteral(__FILE__)).absolutePath() + "/../../data");
 }
 
-// Bytes as hex text, so that a difference reads well.
-QString hex(const QByteArray& bytes) {
-    return QString::fromLatin1(bytes.toHex(' '));
-}
-
 QByteArray readAll(const QString& path) {
     QFile f(path);
     return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
-}
-
-// The option set a window saves as it starts.
-QByteArray startStateOptionSet(FakePlatform& fake) {
-    frmSettings w(fake.platform);
-    const QString path = fake.root() + "/start.lum";
-    fake.dialogs.paths.push_back(path);
-    w.cmdSaveDat_Click();
-    return readAll(path);
 }
 
 } // namespace
 
 TEST(DefaultLum, IsTheStartStateOfTheSettingsWindow) {
     FakePlatform fake;
-    const QByteArray produced = startStateOptionSet(fake);
+    frmSettings w(fake.platform);
+    const QString path = fake.root() + "/start.lum";
+    fake.dialogs.paths.push_back(path);
+    w.cmdSaveDat_Click();
+    const QByteArray produced = readAll(path);
     ASSERT_EQ(produced.size(), 172);
     const QString committed = dataFolder() + "/Default.lum";
-
     if (!qgetenv("LUM_UPDATE_DEFAULT_LUM").isEmpty()) {
         QFile out(committed);
         ASSERT_TRUE(out.open(QIODevice::WriteOnly | QIODevice::Truncate));
         ASSERT_EQ(out.write(produced), produced.size());
     }
-    EXPECT_EQ(hex(readAll(committed)), hex(produced))
+    EXPECT_EQ(readAll(committed).toHex(' '), produced.toHex(' '))
         << "data/Default.lum is out of date: run this test with LUM_UPDATE_DEFAULT_LUM=1";
-}
 
-TEST(DefaultLum, LoadsBackTheStartState) {
-    FakePlatform fake;
-    frmSettings w(fake.platform);
+    // And it loads back: every option as the window starts.
     w.chkQuiet->setChecked(true);
     w.optCPPAL->setChecked(true);
     w.BarColorPaddle->setValue(3);
     w.BarColorPhos->setValue(10);
-    ASSERT_TRUE(w.LoadSettings(dataFolder() + "/Default.lum"));
+    ASSERT_TRUE(w.LoadSettings(committed));
     EXPECT_FALSE(w.chkQuiet->isChecked());
     EXPECT_TRUE(w.optCPDefault->isChecked());
     EXPECT_EQ(w.BarColorPaddle->Value(), sliders::kPaddleStart);
@@ -86,9 +70,8 @@ TEST(DefaultLum, ControllerPicturesLieBesideItUnderTheNamesTheButtonsUse) {
     frmSettings w(fake.platform);
     for (const char* caption : {"Standard Control Layout", "Paddle Control Layout",
                                 "Keyboard Control Layout", "Driving Control Layout"}) {
-        const QString path = dataFolder() + w.GetPicName(caption);
-        QImageReader reader(path);
-        EXPECT_TRUE(reader.canRead()) << caption << ": " << path.toStdString();
+        QImageReader reader(dataFolder() + w.GetPicName(caption));
+        EXPECT_TRUE(reader.canRead()) << caption;
         EXPECT_EQ(reader.format(), "jpeg") << caption;
     }
 }
