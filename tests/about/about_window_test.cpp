@@ -1,4 +1,4 @@
-#include "LocalHttpServer.h"
+#include "support/LocalHttpServer.h"
 #include "support/Boxes.h"
 
 #include "about/AboutArt.h"

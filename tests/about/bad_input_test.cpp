@@ -1,4 +1,4 @@
-#include "LocalHttpServer.h"
+#include "support/LocalHttpServer.h"
 #include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 #include "support/Unreadable.h"

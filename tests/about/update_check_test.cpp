@@ -1,15 +1,11 @@
-#include "LocalHttpServer.h"
 #include "support/Boxes.h"
+#include "support/LocalHttpServer.h"
 
 #include "about/UpdateCheck.h"
-#include "platform/Downloader.h"
-#include "platform/Registry.h"
 
 #include <QDir>
-#include <QElapsedTimer>
 #include <QFile>
 #include <QFileInfo>
-#include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
@@ -24,12 +20,6 @@ const std::string kAsk = "Update available | Version 1.1.13 released June 2nd is
 QByteArray readAll(const QString& path) {
     QFile file(path);
     return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
-}
-
-void writeFile(const QString& path, const QByteArray& content) {
-    QFile file(path);
-    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-    file.write(content);
 }
 
 class UpdateCheckTest : public ::testing::Test {
@@ -169,61 +159,6 @@ TEST_F(UpdateCheckTest, UnsafeInstallerNames) {
     EXPECT_FALSE(server.requests.contains(kInstaller));
     EXPECT_FALSE(QFileInfo::exists(updateFolder()));
     EXPECT_FALSE(QFileInfo::exists(fake.root() + "/evil.run"));
-}
-
-// The seams the check downloads and finds the system information tool through.
-
-// A success replaces the older file with the whole body, after redirects. Every failure
-// returns false, in bounded time, and leaves the older file exactly as it was, with no
-// temporary file beside it.
-TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
-    QTemporaryDir dir;
-    LocalHttpServer server;
-    QtDownloader patient, downloader{std::chrono::milliseconds(300)};
-    const QString target = dir.path() + "/file.bin";
-    const QByteArray body(300000, 'x'); // several network reads
-    server.redirect("/old", server.base() + "/new");
-    server.serve("/new", body);
-    writeFile(target, "older");
-    EXPECT_TRUE(patient.DownloadFile(server.base() + "/old", target));
-    EXPECT_EQ(readAll(target), body);
-    EXPECT_EQ(server.requests, (QStringList{"/old", "/new"}));
-    EXPECT_FALSE(downloader.DownloadFile(server.base() + "/new", dir.path() + "/no/such/file"));
-
-    server.fail("/broken", 500);
-    server.stall("/silent");
-    for (const QString& url : {server.base() + "/gone", server.base() + "/broken",
-                               server.base() + "/silent", LocalHttpServer::refusedBase() + "/any",
-                               QStringLiteral("file:///etc/hostname"), QString()}) {
-        writeFile(target, "older");
-        QElapsedTimer clock;
-        clock.start();
-        EXPECT_FALSE(downloader.DownloadFile(url, target)) << url.toStdString();
-        EXPECT_LT(clock.elapsed(), 10000);
-        EXPECT_EQ(readAll(target), "older");
-        EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files), QStringList{"file.bin"});
-    }
-}
-
-TEST(ToolRegistryTest, AnswersTheToolLookupFromPathOnly) {
-    QTemporaryDir bin;
-    const QByteArray savedPath = qgetenv("PATH");
-    qputenv("PATH", bin.path().toUtf8());
-    ToolRegistry registry;
-    const QString key = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools\\MSINFO");
-    EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine, key, "PATH"));
-    for (const char* tool : {"gnome-system-monitor", "hardinfo"}) {
-        writeFile(bin.path() + u'/' + tool, "#!/bin/sh\n");
-        QFile::setPermissions(bin.path() + u'/' + tool, QFile::ReadOwner | QFile::ExeOwner);
-    }
-    const auto value = registry.QueryValue(kHkeyLocalMachine, key, "PATH");
-    ASSERT_TRUE(value);
-    EXPECT_EQ(value->type, kRegString);
-    EXPECT_EQ(value->data, (bin.path() + "/hardinfo").toUtf8() + '\0'); // best tool first
-    EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine,
-                                     "SOFTWARE\\Microsoft\\Shared Tools Location", "MSINFO"));
-    EXPECT_FALSE(registry.QueryValue(0x80000001u, key, "PATH"));
-    qputenv("PATH", savedPath);
 }
 
 } // namespace
