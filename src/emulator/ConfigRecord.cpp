@@ -257,11 +257,10 @@ std::optional<SoundQueueScale> soundQueueScaleFor(float stored) {
     if (!std::isfinite(stored))
         return std::nullopt;
     const QString text = shortestDecimalText(stored);
-    if (text.size() < 2)
-        return std::nullopt;
     // The hundreds: the text without its last two characters, which must be a number in
-    // its own right (an empty remainder counts as 0).
-    const QString head = text.chopped(2);
+    // its own right. An empty remainder counts as 0, also for a single digit: the slider
+    // can hold one and the window's own save writes it, so a load must take it back.
+    const QString head = text.size() > 2 ? text.chopped(2) : QString();
     double hundreds = 0;
     if (!head.isEmpty()) {
         const std::optional<double> whole = wholeDecimalNumber(head);
@@ -275,10 +274,6 @@ std::optional<SoundQueueScale> soundQueueScaleFor(float stored) {
     // A value with a fraction ("3839.625") has hundreds that do not frame it: the slider
     // would refuse a value outside its range.
     if (!min || !max || !value || *value < *min || *value > *max)
-        return std::nullopt;
-    // A save writes the slider's whole value; one of a single digit ("0.5" held as 0) would
-    // make a file that no load accepts, so the window must not take it from a file either.
-    if (*value >= 0 && *value <= 9)
         return std::nullopt;
     return SoundQueueScale{*min, *max, *value};
 }

@@ -96,17 +96,10 @@ TEST(BadInputOptionFile, ASoundQueueWithAFractionIsRejectedAtItsField) {
     }
 }
 
-// The window must not take a sound-queue value from a file that its own save cannot give
-// back: the slider holds a whole number, and a save of one digit ("0.5" held as 0) makes a
-// file that every load rejects. (Found by fuzzing the load into the window.)
-TEST(BadInputOptionFile, ASoundQueueIsTakenOnlyWhenItsSaveLoadsAgain) {
-    for (const float stored : {0.00439453125f, 0.5f, 1.25f, 9.4f, -0.4f}) {
-        ConfigRecord record;
-        record.BarColorSoundQueue = stored;
-        const ConfigDecode read = decodeConfig(record.encode(), kLimits);
-        EXPECT_EQ(read.firstBad, ConfigField::BarColorSoundQueue) << stored;
-    }
-    // Whatever is taken saves as a value that loads as itself.
+// Whatever sound-queue value the window takes from a file, its own save gives back: the
+// slider holds a whole number, down to a single digit. (Found by fuzzing the load into the
+// window.)
+TEST(BadInputOptionFile, ASoundQueueTakenFromAFileSavesAsAValueThatLoadsAgain) {
     QRandomGenerator random(4608);
     for (int n = 0; n < 100000; ++n) {
         const float stored = n < 4000 ? static_cast<float>(n - 2000) / 16

@@ -235,7 +235,8 @@ TEST(ConfigRecordDecode, TheFirstRejectedFieldInLoadOrderEndsTheLoad) {
         {"text field infinite", 168, true, 0, -inf, ConfigField::txtLowerSens},
         {"slider not a number", 120, true, 0, nan, ConfigField::BarColorPhos},
         {"slider beyond 32 bits", 60, true, 0, 3e9f, ConfigField::BarColorPaddle},
-        {"sound queue of 5", 54, true, 0, 5, ConfigField::BarColorSoundQueue},
+        {"sound queue of 5", 54, true, 0, 5, std::nullopt},
+        {"sound queue outside its hundreds", 54, true, 0, 12.5f, ConfigField::BarColorSoundQueue},
         {"sound queue of 50", 54, true, 0, 50, std::nullopt},
     };
     for (const auto& c : cases) {
@@ -272,11 +273,10 @@ TEST(SoundQueueScale, RangeIsCentredOnTheStoredHundreds) {
         {65536, SoundQueueScale{65400, 65600, 65536}},
         {-5, SoundQueueScale{-100, 100, -5}},
         {12.5f, std::nullopt}, // 12 lies outside 1100 to 1300: the slider refuses it
-        {0.5f, std::nullopt},  // the slider would hold 0, which no file can give back
-        {-0.5f, std::nullopt},
+        {0.5f, SoundQueueScale{-100, 100, 0}},
         {-0.75f, SoundQueueScale{-100, 100, -1}},
-        {5, std::nullopt},
-        {0, std::nullopt},
+        {5, SoundQueueScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives
+        {0, SoundQueueScale{-100, 100, 0}},
         {1e12f, std::nullopt},
         {1e20f, std::nullopt},
         {std::numeric_limits<float>::quiet_NaN(), std::nullopt},

@@ -183,6 +183,20 @@ TEST_F(OptionSet, EveryControlRoundTripsAndTheWindowShowsIt) {
     EXPECT_FALSE(target->chkP1Hard->isTristate());
 }
 
+// The lowest sound-queue window lets the slider reach a single digit; the set saved with
+// it loads again, with the slider where it was.
+TEST_F(OptionSet, ASoundQueueOfOneDigitSavesAndLoads) {
+    auto source = open();
+    for (int i = 0; i < 60; ++i)
+        source->BarColorSoundQueue_KeyPress('-');
+    ASSERT_EQ(source->BarColorSoundQueue->Min(), 1);
+    source->BarColorSoundQueue->setValue(5);
+    auto target = open();
+    ASSERT_TRUE(loadBytes(*target, savedBytes(*source)));
+    EXPECT_EQ(target->BarColorSoundQueue->Value(), 5);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+}
+
 TEST_F(OptionSet, ButtonsAskReportAndAddTheExtension) {
     auto w = open();
     w->lblConfig->setText("before");
