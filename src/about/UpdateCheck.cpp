@@ -12,8 +12,12 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QGuiApplication>
+#include <QSaveFile>
+#include <QTemporaryDir>
 #include <QUrl>
 
+#include <cstdio>
+#include <optional>
 #include <utility>
 
 namespace {
@@ -51,9 +55,29 @@ QString UpdateCheck::updateFolder() const {
     return m_platform.programFolder + QStringLiteral("/Update");
 }
 
+bool UpdateCheck::canWrite(const QString& path) {
+    if (QFileInfo(path).isDir())
+        return false;
+    QSaveFile probe(path);
+    if (!probe.open(QIODevice::WriteOnly))
+        return false;
+    probe.cancelWriting();
+    return true;
+}
+
 bool UpdateCheck::download(const QString& url, const QString& localFilename) {
     const BusyCursor busy;
     return m_platform.network.DownloadFile(url, localFilename);
+}
+
+bool UpdateCheck::downloadNonEmpty(const QString& url, const QString& localFilename) {
+    const QString partial = localFilename + QStringLiteral(".part");
+    const bool ok = download(url, partial) && QFileInfo(partial).size() > 0 &&
+                    std::rename(QFile::encodeName(partial).constData(),
+                                QFile::encodeName(localFilename).constData()) == 0;
+    if (!ok)
+        QFile::remove(partial);
+    return ok;
 }
 
 void UpdateCheck::reportFailedCheck(const QString& text) {
@@ -62,14 +86,23 @@ void UpdateCheck::reportFailedCheck(const QString& text) {
 }
 
 UpdateCheck::Outcome UpdateCheck::Run(bool forumRequest) {
-    if (!download(m_serverBase + web::kUpdateDescriptionPath, localCopyPath())) {
+    // The program folder of an installed copy cannot be written: the description then
+    // goes to a private temporary folder, rather than the check failing as if offline.
+    QString localCopy = localCopyPath();
+    std::optional<QTemporaryDir> spare;
+    if (!canWrite(localCopy)) {
+        spare.emplace();
+        if (spare->isValid())
+            localCopy = spare->filePath(QStringLiteral("tmp"));
+    }
+    if (!download(m_serverBase + web::kUpdateDescriptionPath, localCopy)) {
         reportFailedCheck(QStringLiteral("Failed to connect to the internet"));
         return Outcome::Finished;
     }
 
     UpdateSection section;
     {
-        QFile file(localCopyPath());
+        QFile file(localCopy);
         if (!file.open(QIODevice::ReadOnly)) {
             reportFailedCheck(QStringLiteral("The update information could not be read."));
             return Outcome::Finished;
@@ -150,7 +183,8 @@ UpdateCheck::Outcome UpdateCheck::runUpdate(const UpdateSection& section) {
     const QString installerPath = updateFolder() + u'/' + section.installerFileName;
     if (!QFileInfo(updateFolder()).isDir())
         QDir().mkpath(updateFolder());
-    if (!download(section.installerUrl, installerPath)) {
+    // An installer arrives whole and with something in it, or the older one stays.
+    if (!downloadNonEmpty(section.installerUrl, installerPath)) {
         m_platform.dialogs.MsgBox(m_owner, QStringLiteral("Failed to Download Update"),
                                   MsgButtons::Ok, MsgIcon::None, QStringLiteral("Download Failed"));
         return Outcome::Finished;

@@ -27,7 +27,8 @@ public:
 
     Outcome Run(bool forumRequest);
 
-    // Where the description file is kept: the program folder's "tmp".
+    // Where the description file is kept: the program folder's "tmp" (a private temporary
+    // folder when the program folder cannot be written).
     QString localCopyPath() const;
     // Where installers go: the program folder's "Update".
     QString updateFolder() const;
@@ -36,6 +37,10 @@ private:
     Outcome runUpdate(const UpdateSection& section);
     void openForum(const UpdateSection& section);
     bool download(const QString& url, const QString& localFilename);
+    // Downloads beside the target and puts the file in place only when it holds something.
+    bool downloadNonEmpty(const QString& url, const QString& localFilename);
+    // Whether a file can be written at `path` (an existing one replaced).
+    static bool canWrite(const QString& path);
     void reportFailedCheck(const QString& text);
 
     Platform& m_platform;

@@ -1,6 +1,6 @@
-#include "support/LocalHttpServer.h"
 #include "support/DiskFull.h"
 #include "support/FakePlatform.h"
+#include "support/LocalHttpServer.h"
 #include "support/Unreadable.h"
 
 #include "about/UpdateCheck.h"
@@ -98,15 +98,18 @@ TEST_F(BadUpdateInput, GarbageInTheSectionIsAFailedCheck) {
     EXPECT_FALSE(QFileInfo::exists(fake.programFolder() + "/Update"));
 }
 
-// Folders in place of the files the check writes: the user is told the step failed, and
-// the folders are left as they were.
+// Folders in place of the files the check writes are left as they were: the description
+// goes to a temporary folder instead, and an installer that cannot be stored is a failed
+// download.
 TEST_F(BadUpdateInput, FoldersInPlaceOfTheFilesItWrites) {
     const QString localCopy = fake.makeFolder("program/tmp");
     fake.writeFile("program/tmp/keep.txt", "mine");
     server.serve(kDescription, newerSection("setup.run"));
-    EXPECT_EQ(check(), std::make_pair(QStringLiteral("Update Check Failed"),
-                                      QStringLiteral("Failed to connect to the internet")));
-    EXPECT_TRUE(QFileInfo(localCopy).isDir());
+    fake.dialogs.boxes.clear();
+    UpdateCheck(fake.platform, nullptr, server.base()).Run(false);
+    ASSERT_FALSE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(fake.dialogs.boxes[0].title, "Update available");
+    EXPECT_EQ(QDir(localCopy).entryList(QDir::Files), QStringList{"keep.txt"});
     QDir(localCopy).removeRecursively();
 
     // The installer's name is taken by a folder.
@@ -148,42 +151,38 @@ TEST_F(BadUpdateInput, ADownloadOnAFullDiskFailsAndLeavesNoCutOffFile) {
               QStringList{"setup.run"});
 }
 
-// A program folder where nothing may be written (an installed copy): the description has
-// nowhere to go, which the check reports as a failed connection; nothing is left behind.
-TEST_F(BadUpdateInput, AReadOnlyProgramFolderIsAFailedCheck) {
+// A program folder where nothing may be written (an installed copy) still checks: the
+// description goes to a temporary folder, and nothing is left behind.
+TEST_F(BadUpdateInput, AReadOnlyProgramFolderStillChecks) {
     server.serve(kDescription, newerSection("setup.run"));
     ASSERT_TRUE(QFile::setPermissions(fake.programFolder(), QFile::ReadOwner | QFile::ExeOwner));
-    std::pair<QString, QString> box;
+    fake.dialogs.boxes.clear();
     {
         const NoPermissionOverride asAnyone;
         ASSERT_TRUE(asAnyone.holds());
-        box = check();
+        UpdateCheck(fake.platform, nullptr, server.base()).Run(false);
     }
     QFile::setPermissions(fake.programFolder(),
                           QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
-    EXPECT_EQ(box, std::make_pair(QStringLiteral("Update Check Failed"),
-                                  QStringLiteral("Failed to connect to the internet")));
+    ASSERT_FALSE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(fake.dialogs.boxes[0].title, "Update available");
     EXPECT_TRUE(
         QDir(fake.programFolder())
             .isEmpty(QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot));
 }
 
-// Installers that do not arrive whole, or cannot be stored: "Download Failed", nothing is
-// started, and an older installer of the same name is kept. One that arrives empty is what
-// the server sent: it is stored and reported like any other.
+// Installers that do not arrive whole, arrive empty, or cannot be stored: "Download
+// Failed", nothing is started, and an older installer of the same name is kept.
 TEST_F(BadUpdateInput, InstallersThatCannotBeStoredWholeAreNotKept) {
     const QString installer = fake.programFolder() + "/Update/setup.run";
     const struct {
         const char* name;
         std::function<void()> serve;
         bool readOnlyFolder;
-        const char* title;
     } cases[] = {
-        {"cut off", [&] { server.cutOff("/setup.run", noise(1000, 2), 100000); }, false,
-         "Download Failed"},
-        {"read-only Update folder", [&] { server.serve("/setup.run", "NEW INSTALLER"); }, true,
-         "Download Failed"},
-        {"empty", [&] { server.serve("/setup.run", QByteArray()); }, false, "Download Complete"},
+        {"cut off", [&] { server.cutOff("/setup.run", noise(1000, 2), 100000); }, false},
+        {"read-only Update folder", [&] { server.serve("/setup.run", "NEW INSTALLER"); }, true},
+        {"empty", [&] { server.serve("/setup.run", QByteArray()); }, false},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.name);
@@ -203,9 +202,8 @@ TEST_F(BadUpdateInput, InstallersThatCannotBeStoredWholeAreNotKept) {
         QFile::setPermissions(fake.programFolder() + "/Update",
                               QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
         ASSERT_EQ(fake.dialogs.boxes.size(), 2u);
-        EXPECT_EQ(fake.dialogs.boxes[1].title, c.title);
-        const bool failed = QString::fromLatin1(c.title) == "Download Failed";
-        EXPECT_EQ(QFileInfo(installer).size(), failed ? 13 : 0);
+        EXPECT_EQ(fake.dialogs.boxes[1].title, "Download Failed");
+        EXPECT_EQ(QFileInfo(installer).size(), 13);
         EXPECT_EQ(QDir(fake.programFolder() + "/Update").entryList(QDir::Files | QDir::Hidden),
                   QStringList{"setup.run"});
     }
