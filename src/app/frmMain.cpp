@@ -49,11 +49,12 @@ QString folderKey(int n, const char* suffix) {
 } // namespace
 
 frmMain::frmMain(Platform& platform) : m_platform(platform) {
+    // First, so that the listing has the whole building of the window to run in.
+    startFirstListing();
     setObjectName(QStringLiteral("frmMain"));
     setWindowTitle(QStringLiteral("lum"));
     createControls();
     createMenus();
-    startFirstListing();
 }
 
 frmMain::~frmMain() = default;
