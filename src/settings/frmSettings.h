@@ -29,8 +29,8 @@ class QTreeWidget;
 class QTreeWidgetItem;
 class frmPicPreview;
 
-// The settings window: created hidden by the main window's load and kept until the
-// program ends. Its close box only hides it; its option controls are the one holder of
+// The settings window: created hidden by the main window when first needed and kept
+// until the program ends. Its close box only hides it; its option controls are the one holder of
 // the emulator options, read whether the window is shown or not.
 class frmSettings : public QWidget {
     Q_OBJECT
