@@ -1,27 +1,15 @@
+#include "support/Files.h"
 #include "support/LocalHttpServer.h"
 
 #include "platform/Downloader.h"
 #include "platform/Registry.h"
 
-#include <QDir>
 #include <QElapsedTimer>
-#include <QFile>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
 namespace {
-
-QByteArray readAll(const QString& path) {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
-}
-
-void writeFile(const QString& path, const QByteArray& content) {
-    QFile file(path);
-    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-    file.write(content);
-}
 
 // A success replaces the older file with the whole body, after redirects. Every failure
 // returns false, in bounded time, and leaves the older file exactly as it was, with no
@@ -34,9 +22,9 @@ TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     const QByteArray body(300000, 'x'); // several network reads
     server.redirect("/old", server.base() + "/new");
     server.serve("/new", body);
-    writeFile(target, "older");
+    ASSERT_TRUE(putFile(target, "older"));
     EXPECT_TRUE(patient.DownloadFile(server.base() + "/old", target));
-    EXPECT_EQ(readAll(target), body);
+    EXPECT_EQ(fileBytes(target), body);
     EXPECT_EQ(server.requests, (QStringList{"/old", "/new"}));
     EXPECT_FALSE(downloader.DownloadFile(server.base() + "/new", dir.path() + "/no/such/file"));
 
@@ -45,12 +33,12 @@ TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     for (const QString& url : {server.base() + "/gone", server.base() + "/broken",
                                server.base() + "/silent", LocalHttpServer::refusedBase() + "/any",
                                QStringLiteral("file:///etc/hostname"), QString()}) {
-        writeFile(target, "older");
+        ASSERT_TRUE(putFile(target, "older"));
         QElapsedTimer clock;
         clock.start();
         EXPECT_FALSE(downloader.DownloadFile(url, target)) << url.toStdString();
         EXPECT_LT(clock.elapsed(), 10000);
-        EXPECT_EQ(readAll(target), "older");
+        EXPECT_EQ(fileBytes(target), "older");
         EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files), QStringList{"file.bin"});
     }
 }
@@ -63,7 +51,7 @@ TEST(ToolRegistryTest, AnswersTheToolLookupFromPathOnly) {
     const QString key = QStringLiteral("SOFTWARE\\Microsoft\\Shared Tools\\MSINFO");
     EXPECT_FALSE(registry.QueryValue(kHkeyLocalMachine, key, "PATH"));
     for (const char* tool : {"gnome-system-monitor", "hardinfo"}) {
-        writeFile(bin.path() + u'/' + tool, "#!/bin/sh\n");
+        ASSERT_TRUE(putFile(bin.path() + u'/' + tool, "#!/bin/sh\n"));
         QFile::setPermissions(bin.path() + u'/' + tool, QFile::ReadOwner | QFile::ExeOwner);
     }
     const auto value = registry.QueryValue(kHkeyLocalMachine, key, "PATH");
