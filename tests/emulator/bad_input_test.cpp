@@ -1,3 +1,4 @@
+#include "support/Files.h"
 #include "support/Unreadable.h"
 
 #include "emulator/OptionFile.h"
@@ -8,6 +9,8 @@
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
+
+#include <sys/stat.h>
 
 namespace {
 
@@ -53,14 +56,36 @@ TEST(BadInputOptionFile, GarbageIsEitherAValidSetOrStopsAtTheFirstBadField) {
     EXPECT_LT(valid, 300); // random singles are rarely all whole slider values
 }
 
-// A file that exists but cannot be read is reported, not applied.
-TEST(BadInputOptionFile, AnUnreadableFileIsReportedAndNothingApplied) {
+// Files that hold no whole record, or cannot be read, are reported and nothing of them is
+// applied.
+TEST(BadInputOptionFile, UnusableSourcesAreReportedNotApplied) {
     QTemporaryDir dir;
-    const QString path = dir.filePath("locked.lum");
-    ASSERT_FALSE(makeUnreadable(path, ConfigRecord().encode()).isEmpty());
-    const ConfigDecode read = readOptionFile(path, kLimits);
-    EXPECT_EQ(read.status, ConfigStatus::Unreadable);
-    EXPECT_EQ(read.applicableCount(), 0);
+    const QString shortFile = dir.filePath("short.lum");
+    ASSERT_TRUE(putFile(shortFile, ConfigRecord().encode().left(171)));
+    const QString empty = dir.filePath("empty.lum");
+    ASSERT_TRUE(putFile(empty, {}));
+    const QString fifo = dir.filePath("pipe.lum");
+    ASSERT_EQ(mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
+    const QString locked = makeUnreadable(dir.filePath("locked.lum"), ConfigRecord().encode());
+    ASSERT_FALSE(locked.isEmpty());
+
+    const struct {
+        QString path;
+        ConfigStatus status;
+    } cases[] = {
+        {shortFile, ConfigStatus::Short},
+        {empty, ConfigStatus::Short},
+        {dir.filePath("absent.lum"), ConfigStatus::Unreadable},
+        {locked, ConfigStatus::Unreadable},
+        {dir.path(), ConfigStatus::Unreadable},
+        // A pipe would block a reader; it is refused without being opened.
+        {fifo, ConfigStatus::Unreadable},
+    };
+    for (const auto& c : cases) {
+        const ConfigDecode read = readOptionFile(c.path, kLimits);
+        EXPECT_EQ(read.status, c.status) << qPrintable(c.path);
+        EXPECT_EQ(read.applicableCount(), 0) << qPrintable(c.path);
+    }
 }
 
 // An oversized file (a gigabyte, here sparse) is read for its first record only.
@@ -81,19 +106,6 @@ TEST(BadInputOptionFile, AnOversizedFileIsReadForItsFirstRecordOnly) {
     EXPECT_LT(timer.elapsed(), 10000); // a hang guard only
     ASSERT_TRUE(read.ok());
     EXPECT_EQ(read.record, record);
-}
-
-// A sound-queue value with a fraction gives a range that does not hold the value, which
-// the slider would refuse: the set is reported at that field instead of loading a value
-// the file never held.
-TEST(BadInputOptionFile, ASoundQueueWithAFractionIsRejectedAtItsField) {
-    for (const float stored : {3839.625f, 12.5f, 99.75f}) {
-        ConfigRecord record;
-        record.BarColorSoundQueue = stored;
-        const ConfigDecode read = decodeConfig(record.encode(), kLimits);
-        EXPECT_EQ(read.status, ConfigStatus::Invalid) << stored;
-        EXPECT_EQ(read.firstBad, ConfigField::BarColorSoundQueue) << stored;
-    }
 }
 
 // Whatever sound-queue value the window takes from a file, its own save gives back: the

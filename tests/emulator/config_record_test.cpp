@@ -143,12 +143,17 @@ TEST(ConfigRecordEncode, FieldTableMatchesTheLayoutAndLoadOrder) {
     EXPECT_EQ(configFieldInfo(ConfigField::optPaddleM2_3).element, 3);
 }
 
-TEST(ConfigRecordDecode, RoundTripKeepsEveryField) {
-    const ConfigRecord original = knownRecord();
-    const ConfigDecode decoded = decodeConfig(original.encode(), kLimits);
+// Reserved bytes are ignored on the way in and written back as zeros.
+TEST(ConfigRecordDecode, RoundTripKeepsEveryFieldAndClearsTheReservedBytes) {
+    QByteArray data = knownRecord().encode();
+    for (int at = 0; at < 172; ++at)
+        if (inReservedArea(at))
+            data[at] = char(0xA5);
+    const ConfigDecode decoded = decodeConfig(data, kLimits);
     ASSERT_TRUE(decoded.ok());
     EXPECT_EQ(decoded.applicableCount(), kConfigFieldCount);
-    EXPECT_EQ(decoded.record, original);
+    EXPECT_EQ(decoded.record, knownRecord());
+    EXPECT_EQ(decoded.record.encode(), knownRecord().encode());
 
     // Every field through the generic accessors as well.
     ConfigRecord copy;
@@ -156,27 +161,16 @@ TEST(ConfigRecordDecode, RoundTripKeepsEveryField) {
         switch (f.kind) {
         case ConfigFieldKind::ListIndex:
         case ConfigFieldKind::Check:
-            setConfigInt(copy, f.field, configInt(original, f.field));
+            setConfigInt(copy, f.field, configInt(knownRecord(), f.field));
             break;
         case ConfigFieldKind::Flag:
-            setConfigFlag(copy, f.field, configFlag(original, f.field));
+            setConfigFlag(copy, f.field, configFlag(knownRecord(), f.field));
             break;
         default:
-            setConfigSingle(copy, f.field, configSingle(original, f.field));
+            setConfigSingle(copy, f.field, configSingle(knownRecord(), f.field));
         }
     }
-    EXPECT_EQ(copy, original);
-}
-
-TEST(ConfigRecordDecode, ReservedBytesAreIgnoredAndWrittenBackAsZeros) {
-    QByteArray data = knownRecord().encode();
-    for (int at = 0; at < 172; ++at)
-        if (inReservedArea(at))
-            data[at] = char(0xA5);
-    const ConfigDecode decoded = decodeConfig(data, kLimits);
-    ASSERT_TRUE(decoded.ok());
-    EXPECT_EQ(decoded.record, knownRecord());
-    EXPECT_EQ(decoded.record.encode(), knownRecord().encode());
+    EXPECT_EQ(copy, knownRecord());
 }
 
 TEST(ConfigRecordDecode, AnyNonZeroFlagSelectsAndFourZeroFlagsSelectNone) {
@@ -205,10 +199,6 @@ TEST(ConfigRecordDecode, ShortDataIsReportedAndNothingApplies) {
         EXPECT_EQ(decoded.status, ConfigStatus::Short) << size;
         EXPECT_EQ(decoded.applicableCount(), 0) << size;
     }
-    // Bytes after the record are not part of it.
-    const ConfigDecode longer = decodeConfig(full + QByteArray(40, '\x7F'), kLimits);
-    ASSERT_TRUE(longer.ok());
-    EXPECT_EQ(longer.record, knownRecord());
 }
 
 TEST(ConfigRecordDecode, TheFirstRejectedFieldInLoadOrderEndsTheLoad) {
@@ -235,9 +225,7 @@ TEST(ConfigRecordDecode, TheFirstRejectedFieldInLoadOrderEndsTheLoad) {
         {"text field infinite", 168, true, 0, -inf, ConfigField::txtLowerSens},
         {"slider not a number", 120, true, 0, nan, ConfigField::BarColorPhos},
         {"slider beyond 32 bits", 60, true, 0, 3e9f, ConfigField::BarColorPaddle},
-        {"sound queue of 5", 54, true, 0, 5, std::nullopt},
         {"sound queue outside its hundreds", 54, true, 0, 12.5f, ConfigField::BarColorSoundQueue},
-        {"sound queue of 50", 54, true, 0, 50, std::nullopt},
     };
     for (const auto& c : cases) {
         QByteArray data = knownRecord().encode();
@@ -272,7 +260,10 @@ TEST(SoundQueueScale, RangeIsCentredOnTheStoredHundreds) {
         {150, SoundQueueScale{0, 200, 150}},
         {65536, SoundQueueScale{65400, 65600, 65536}},
         {-5, SoundQueueScale{-100, 100, -5}},
-        {12.5f, std::nullopt}, // 12 lies outside 1100 to 1300: the slider refuses it
+        // A fraction: the hundreds do not frame the value (12 lies outside 1100 to 1300).
+        {12.5f, std::nullopt},
+        {99.75f, std::nullopt},
+        {3839.625f, std::nullopt},
         {0.5f, SoundQueueScale{-100, 100, 0}},
         {-0.75f, SoundQueueScale{-100, 100, -1}},
         {5, SoundQueueScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives

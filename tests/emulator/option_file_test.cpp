@@ -1,15 +1,12 @@
 #include "emulator/OptionFile.h"
 #include "support/DiskFull.h"
+#include "support/Files.h"
 
 #include <QDir>
-#include <QFile>
+#include <QFileInfo>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
-
-#include <csignal>
-#include <sys/resource.h>
-#include <sys/stat.h>
 
 namespace {
 
@@ -29,32 +26,16 @@ ConfigRecord sampleRecord() {
     return r;
 }
 
-QByteArray readAll(const QString& path) {
-    QFile f(path);
-    return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray("<unreadable>");
-}
-
-void writeBytes(const QString& path, const QByteArray& bytes) {
-    QFile f(path);
-    ASSERT_TRUE(f.open(QIODevice::WriteOnly));
-    ASSERT_EQ(f.write(bytes), bytes.size());
-}
-
 } // namespace
 
 TEST(OptionFile, WrittenFileReadsBackAndReplacesAnOlderOneWhole) {
     QTemporaryDir dir;
     const QString path = dir.filePath("set.lum");
     // An older, longer file with junk everywhere, reserved areas included.
-    writeBytes(path, QByteArray(300, '\x5A'));
+    ASSERT_TRUE(putFile(path, QByteArray(300, '\x5A')));
 
     ASSERT_TRUE(writeOptionFile(path, sampleRecord()));
-    const QByteArray bytes = readAll(path);
-    ASSERT_EQ(bytes.size(), 172);
-    EXPECT_EQ(bytes.mid(24, 18), QByteArray(18, '\0'));
-    EXPECT_EQ(bytes.mid(58, 2), QByteArray(2, '\0'));
-    EXPECT_EQ(bytes.mid(64, 4), QByteArray(4, '\0'));
-
+    EXPECT_EQ(fileBytes(path), sampleRecord().encode());
     const ConfigDecode read = readOptionFile(path, kLimits);
     ASSERT_TRUE(read.ok());
     EXPECT_EQ(read.record, sampleRecord());
@@ -66,7 +47,7 @@ TEST(OptionFile, AFailedWriteReportsFailureAndKeepsTheOlderFile) {
     QTemporaryDir dir;
     const QString path = dir.filePath("old.lum");
     const QByteArray older = sampleRecord().encode();
-    writeBytes(path, older);
+    ASSERT_TRUE(putFile(path, older));
 
     ConfigRecord changed = sampleRecord();
     changed.comboVideoMode = 1;
@@ -74,14 +55,14 @@ TEST(OptionFile, AFailedWriteReportsFailureAndKeepsTheOlderFile) {
         const DiskFull limit(100);
         EXPECT_FALSE(writeOptionFile(path, changed));
     }
-    EXPECT_EQ(readAll(path), older);
+    EXPECT_EQ(fileBytes(path), older);
     EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files), QStringList{"old.lum"});
 }
 
 TEST(OptionFile, TargetsThatCannotBeWrittenReportFailure) {
     QTemporaryDir dir;
     const QString notAFolder = dir.filePath("plain");
-    writeBytes(notAFolder, "x");
+    ASSERT_TRUE(putFile(notAFolder, "x"));
     QDir(dir.path()).mkdir("taken.lum");
 
     for (const QString& path :
@@ -89,40 +70,4 @@ TEST(OptionFile, TargetsThatCannotBeWrittenReportFailure) {
         EXPECT_FALSE(writeOptionFile(path, sampleRecord())) << qPrintable(path);
     // Something still exists under the last name; that alone is no success.
     EXPECT_TRUE(QFileInfo(dir.filePath("taken.lum")).isDir());
-}
-
-TEST(OptionFile, ShortMissingAndNonFileSourcesAreReportedNotApplied) {
-    QTemporaryDir dir;
-    const QString shortFile = dir.filePath("short.lum");
-    writeBytes(shortFile, sampleRecord().encode().left(171));
-    const QString empty = dir.filePath("empty.lum");
-    writeBytes(empty, {});
-    const QString fifo = dir.filePath("pipe.lum");
-    ASSERT_EQ(mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
-
-    const struct {
-        QString path;
-        ConfigStatus status;
-    } cases[] = {
-        {shortFile, ConfigStatus::Short},
-        {empty, ConfigStatus::Short},
-        {dir.filePath("absent.lum"), ConfigStatus::Unreadable},
-        {dir.path(), ConfigStatus::Unreadable},
-        // A pipe would block a reader; it is refused without being opened.
-        {fifo, ConfigStatus::Unreadable},
-    };
-    for (const auto& c : cases) {
-        const ConfigDecode read = readOptionFile(c.path, kLimits);
-        EXPECT_EQ(read.status, c.status) << qPrintable(c.path);
-        EXPECT_EQ(read.applicableCount(), 0) << qPrintable(c.path);
-    }
-}
-
-TEST(OptionFile, ALongerFileIsReadForItsFirstRecordOnly) {
-    QTemporaryDir dir;
-    const QString path = dir.filePath("long.lum");
-    writeBytes(path, sampleRecord().encode() + QByteArray(1000, '\x01'));
-    const ConfigDecode read = readOptionFile(path, kLimits);
-    ASSERT_TRUE(read.ok());
-    EXPECT_EQ(read.record, sampleRecord());
 }
