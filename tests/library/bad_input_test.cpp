@@ -3,6 +3,7 @@
 #include "library/GameDatabase.h"
 
 #include "support/FakePlatform.h"
+#include "support/Files.h"
 #include "support/Unreadable.h"
 
 #include <QDir>
@@ -42,43 +43,24 @@ TEST(BadInputGameDatabase, EveryShapeGivesAnAnswerAndTheFileIsLeftAsItWas) {
         std::function<void(const QString& path)> prepare;
         qint16 id;
     };
+    const auto holding = [](const QByteArray& bytes) {
+        return [bytes](const QString& p) { putFile(p, bytes); };
+    };
     const QByteArray match = record(57, kKey).encode();
+    QByteArray noise(56 * 500, '\0');
+    QRandomGenerator random(11);
+    for (char& c : noise)
+        c = static_cast<char>(random.bounded(256));
+    // The noise must not hold the key itself at a record's CRC place.
+    for (qsizetype at = GameRecord::kCRCOffset; at < noise.size(); at += 56)
+        noise[at] = 0;
     const Case cases[] = {
         {"missing", [](const QString&) {}, 0},
-        {"empty",
-         [](const QString& p) {
-             QFile f(p);
-             f.open(QIODevice::WriteOnly);
-         },
-         0},
-        {"truncated in the matching record",
-         [&](const QString& p) {
-             QFile f(p);
-             f.open(QIODevice::WriteOnly);
-             f.write(record(1, 5).encode() + match.left(55));
-         },
-         0},
+        {"empty", holding({}), 0},
+        {"truncated in the matching record", holding(record(1, 5).encode() + match.left(55)), 0},
         {"truncated after the matching record",
-         [&](const QString& p) {
-             QFile f(p);
-             f.open(QIODevice::WriteOnly);
-             f.write(record(1, 5).encode() + match + match.left(30));
-         },
-         57},
-        {"garbage before the match",
-         [&](const QString& p) {
-             QByteArray noise(56 * 500, '\0');
-             QRandomGenerator random(11);
-             for (char& c : noise)
-                 c = static_cast<char>(random.bounded(256));
-             // The noise must not hold the key itself at a record's CRC place.
-             for (qsizetype at = GameRecord::kCRCOffset; at < noise.size(); at += 56)
-                 noise[at] = 0;
-             QFile f(p);
-             f.open(QIODevice::WriteOnly);
-             f.write(noise + match);
-         },
-         57},
+         holding(record(1, 5).encode() + match + match.left(30)), 57},
+        {"garbage before the match", holding(noise + match), 57},
         {"unreadable", [&](const QString& p) { makeUnreadable(p, match); }, 0},
         {"a folder", [](const QString& p) { QDir().mkpath(p); }, 0},
         {"a FIFO",
@@ -133,9 +115,9 @@ TEST(BadInputRomFolders, OnlyReadableRegularFilesAreListed) {
     lister.setPath(folder);
     EXPECT_EQ(lister.names(), QStringList({"good.bin", "link.bin"}));
 
-    // A file, an empty folder, a missing one.
-    for (const QString& path :
-         {fake.writeFile("file.bin", "x"), fake.makeFolder("empty"), fake.root() + "/gone"}) {
+    // A file, an empty folder, a missing one, no path at all.
+    for (const QString& path : {fake.writeFile("file.bin", "x"), fake.makeFolder("empty"),
+                                fake.root() + "/gone", QString()}) {
         lister.setPath(path);
         EXPECT_EQ(lister.ListCount(), 0) << path.toStdString();
     }
@@ -221,19 +203,6 @@ TEST(BadInputRomFolders, NamesThatAreNotUtf8AreListedAndReportedWhenOpened) {
     EXPECT_EQ(crc.GetCRCFromFile(), 0);
     ASSERT_EQ(fake.dialogs.boxes.size(), 1u);
     EXPECT_EQ(fake.dialogs.boxes[0].text, "Error: 53. File not found");
-}
-
-// ROM files for the CRC: missing, folders, FIFOs and unreadable files are covered by the
-// engine's own tests; an empty or truncated image is just a short image.
-TEST(BadInputRomFiles, EmptyAndUnreadableImagesGiveAResultWithoutHanging) {
-    FakePlatform fake;
-    CCRC32 crc(fake.dialogs);
-    crc.setInputFileName(fake.writeFile("empty.bin"));
-    EXPECT_EQ(crc.GetCRCFromFile(), 0); // the CRC-32 of no bytes
-    const QString unreadable = fake.root() + "/unreadable.bin";
-    makeUnreadable(unreadable, "ROM");
-    crc.setInputFileName(unreadable);
-    EXPECT_EQ(crc.GetCRCFromFile(), 0);
 }
 
 // An image far bigger than any cartridge (64 MiB, here sparse) is read to its end, with
