@@ -22,6 +22,12 @@ public:
             fake.writeFile(name + "/" + f);
         return folder;
     }
+    // Both paths known, so that the start goes straight to the list: the emulator folder and
+    // one ROM folder holding a.bin.
+    void storePaths() {
+        fake.store.SaveSetting("Settings", "Z26Path", fake.root());
+        storeFolder(1, romFolder("roms", {"a.bin"}));
+    }
     frmMain& load() {
         window = std::make_unique<frmMain>(fake.platform);
         window->Form_Load();

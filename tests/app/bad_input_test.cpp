@@ -1,7 +1,10 @@
 #include "AppFixture.h"
+#include "support/Boxes.h"
 #include "support/DiskFull.h"
+#include "support/Files.h"
 #include "support/Unreadable.h"
 
+#include "emulator/ConfigRecord.h"
 #include "library/RomListModel.h"
 #include "platform/SettingsStore.h"
 #include "settings/frmSettings.h"
@@ -15,15 +18,11 @@
 #include <QFileInfo>
 #include <QGuiApplication>
 #include <QImage>
-#include <QImageWriter>
 #include <QLabel>
 #include <QMenu>
 #include <QScreen>
 
-#include <csignal>
 #include <functional>
-
-#include <sys/resource.h>
 
 #include <gtest/gtest.h>
 
@@ -49,11 +48,6 @@ QByteArray claimedPng(quint32 width, quint32 height) {
         header[20 + i] = static_cast<char>((height >> (24 - 8 * i)) & 0xFF);
     }
     return header;
-}
-
-QByteArray contents(const QString& path) {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<unreadable>");
 }
 
 } // namespace
@@ -98,6 +92,7 @@ TEST(BadInputMainWindow, BadBackgroundPicturesShowNone) {
         {"truncated", [](FakePlatform& f) { return f.writeFile("cut.png", png(64, 64).left(60)); }},
         {"oversized",
          [](FakePlatform& f) { return f.writeFile("huge.png", claimedPng(100000, 100000)); }},
+        {"garbage", [](FakePlatform& f) { return f.writeFile("junk.png", "not a picture"); }},
         {"absurd header",
          [](FakePlatform& f) { return f.writeFile("bad.png", claimedPng(0xFFFFFFFF, 1)); }},
         {"unreadable",
@@ -110,6 +105,7 @@ TEST(BadInputMainWindow, BadBackgroundPicturesShowNone) {
         const QString path = c.make(app.fake);
         app.fake.store.SaveSetting(kSettings, "BackImg", path);
         frmMain& w = app.load();
+        EXPECT_TRUE(w.mnuBackImgEnabled->isChecked());
         EXPECT_FALSE(w.vbalListViewCtl1->hasPicture());
         EXPECT_TRUE(w.vbalProgressBar1->BarPicture().isNull());
         EXPECT_EQ(app.fake.dialogs.boxes.size(), 1u); // only the first-run question
@@ -143,8 +139,7 @@ TEST(BadInputMainWindow, ABrokenGameDatabaseIdentifiesNothing) {
             QDir().mkpath(database);
         else
             makeUnreadable(database, QByteArray(56, '\0'));
-        app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
-        app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+        app.storePaths();
         frmMain& w = app.load();
         w.vbalListViewCtl1->setCurrentIndex(w.listModel().index(0, 0));
         w.vbalListViewCtl1_MouseDown(Qt::RightButton, QPoint(10, 10));
@@ -175,78 +170,85 @@ TEST(BadInputMainWindow, ClosesNormallyWhenTheSettingsFolderCannotBeWritten) {
         EXPECT_EQ(w.windowTitle(), "lum - 1 ROM Found");
         w.close();
     }
-    EXPECT_EQ(contents(blocker), "not a folder");
+    EXPECT_EQ(fileBytes(blocker), "not a folder");
 }
 
 // The same with a store file that exists but cannot grow (a full disk): the file on disk
 // is left whole, and no temporary file is left beside it.
 TEST(BadInputMainWindow, ClosingOnAFullDiskLeavesTheStoreFileWhole) {
     AppFixture app;
-    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
-    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+    app.storePaths();
     frmMain& w = app.load();
     w.resize(w.width() + 40, w.height() + 40);
-    const QByteArray before = contents(app.fake.iniPath());
+    const QByteArray before = fileBytes(app.fake.iniPath());
     const QString folder = QFileInfo(app.fake.iniPath()).absolutePath();
     {
         const DiskFull full(0);
         w.close();
         app.window.reset();
     }
-    EXPECT_EQ(contents(app.fake.iniPath()), before);
+    EXPECT_EQ(fileBytes(app.fake.iniPath()), before);
     EXPECT_EQ(QDir(folder).entryList(QDir::Files | QDir::Hidden), QStringList{"lum.ini"});
 }
 
-// Default.lum in bad shapes at start-up: the start goes on, the settings window says the
-// file is corrupt (and the one message box says so too); an oversized file is read for its
-// first record.
-TEST(BadInputMainWindow, DefaultOptionSetInEveryBadShape) {
+// Default.lum in every shape at start-up: the start goes on; a good or oversized file loads
+// its first record quietly; a corrupt one is said in one box and the settings window opens
+// on its first tab with the caption saying so.
+TEST(BadInputMainWindow, DefaultOptionSetInEveryShape) {
+    const std::string corruptBox = "lum | .lum file is corrupt\r\nPlease verify settings and "
+                                   "re-save to correct this problem | Ok | None";
+    const QString loaded = "Default.lum was succesfully loaded";
     const QString corrupt =
         "Default.lum is corrupt.  Please verify settings and re-save to correct the problem.";
+    QByteArray badField = ConfigRecord().encode();
+    badField[14] = 3; // a check box state that does not exist
+    const auto holding = [](const QByteArray& bytes) {
+        return [bytes](FakePlatform& f) { f.writeFile("program/Default.lum", bytes); };
+    };
     const struct {
         const char* name;
         std::function<void(FakePlatform&)> make;
-        bool loads;
+        QString caption;
     } cases[] = {
-        {"empty", [](FakePlatform& f) { f.writeFile("program/Default.lum"); }, false},
-        {"garbage",
-         [](FakePlatform& f) { f.writeFile("program/Default.lum", QByteArray(172, '\xFF')); },
-         false},
+        {"missing", [](FakePlatform&) {}, "Default.lum couldn't be loaded"},
+        {"valid", holding(ConfigRecord().encode()), loaded},
+        {"empty", holding({}), corrupt},
+        {"truncated", holding(ConfigRecord().encode().left(100)), corrupt},
+        {"a bad field", holding(badField), corrupt},
+        {"garbage", holding(QByteArray(172, '\xFF')), corrupt},
         {"unreadable",
          [](FakePlatform& f) {
              makeUnreadable(f.programFolder() + "/Default.lum", QByteArray(172, '\0'));
          },
-         false},
-        {"a folder", [](FakePlatform& f) { f.makeFolder("program/Default.lum"); }, false},
+         corrupt},
+        {"a folder", [](FakePlatform& f) { f.makeFolder("program/Default.lum"); }, corrupt},
         {"oversized",
          [](FakePlatform& f) {
              QFile file(f.programFolder() + "/Default.lum");
              file.open(QIODevice::WriteOnly);
-             QByteArray record(172, '\0');
-             record[54 + 2] = '\x90'; // sound queue 4608.0 as a little-endian single
-             record[54 + 3] = '\x45';
-             file.write(record);
+             file.write(ConfigRecord().encode());
              file.resize(qint64(1) << 30); // a gigabyte, sparse
          },
-         true},
+         loaded},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.name);
         AppFixture app;
-        app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
-        app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+        app.storePaths();
         c.make(app.fake);
         frmMain& w = app.load();
         EXPECT_EQ(w.windowTitle(), "lum - 1 ROM Found"); // the start went on
-        if (c.loads) {
-            EXPECT_EQ(w.settingsWindow().lblConfig->text(), "Default.lum was succesfully loaded");
-            EXPECT_TRUE(app.fake.dialogs.boxes.empty());
-        } else {
-            EXPECT_EQ(w.settingsWindow().lblConfig->text(), corrupt);
-            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
-            EXPECT_EQ(app.fake.dialogs.boxes[0].text,
-                      ".lum file is corrupt\r\nPlease verify settings and re-save to correct this "
-                      "problem");
+        frmSettings& settings = w.settingsWindow();
+        EXPECT_EQ(settings.lblConfig->text(), c.caption);
+        EXPECT_EQ(settings.lblConfig->toolTip(),
+                  std::string(c.name) == "missing"
+                      ? "Default.lum need's to be in the same folder as lum.exe"
+                      : "");
+        const bool bad = c.caption == corrupt;
+        EXPECT_EQ(boxLines(app.fake.dialogs), bad ? Lines{corruptBox} : Lines{});
+        EXPECT_EQ(settings.isVisible(), bad);
+        if (bad) {
+            EXPECT_EQ(settings.SelectedTabKey(), "Settings");
         }
     }
 }
@@ -264,9 +266,9 @@ TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
     w.mnuAboutz26Readme->trigger();
     w.mnuAboutCopying->trigger();
     EXPECT_TRUE(app.fake.shell.textFiles.isEmpty());
-    ASSERT_EQ(app.fake.dialogs.boxes.size(), 2u);
-    EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
-    EXPECT_EQ(app.fake.dialogs.boxes[1].text, "Error loading COPYING.TXT");
+    EXPECT_EQ(boxLines(app.fake.dialogs),
+              (Lines{"Error | Error loading README.TXT | Ok | Exclamation",
+                     "Error | Error loading COPYING.TXT | Ok | Exclamation"}));
 }
 
 // The emulator path in bad shapes when a game is started: a path that leads nowhere is
@@ -274,8 +276,7 @@ TEST(BadInputMainWindow, ADocumentThatIsAFolderIsReported) {
 // name taken by a folder, some other file) ends the launch without a word. Nothing starts.
 TEST(BadInputMainWindow, TheEmulatorPathInBadShapesAtLaunch) {
     AppFixture app;
-    app.fake.store.SaveSetting(kSettings, "Z26Path", app.fake.root());
-    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
+    app.storePaths();
     frmMain& w = app.load();
     w.vbalListViewCtl1->setCurrentIndex(w.listModel().index(0, 0));
     const struct {
@@ -286,6 +287,7 @@ TEST(BadInputMainWindow, TheEmulatorPathInBadShapesAtLaunch) {
         {"empty", QString(), true},
         {"garbage", QStringLiteral("\x01<?>|\n"), true},
         {"missing", app.fake.root() + "/gone/z26", true},
+        {"a folder without the emulator", app.fake.makeFolder("other"), false},
         {"a folder named like the emulator", app.fake.makeFolder("emu/z26").chopped(4), false},
         {"another file", app.fake.writeFile("notes.txt", "hello"), false},
     };
@@ -294,12 +296,11 @@ TEST(BadInputMainWindow, TheEmulatorPathInBadShapesAtLaunch) {
         app.fake.dialogs.boxes.clear();
         app.fake.store.SaveSetting(kSettings, "Z26Path", c.stored);
         w.LoadROM();
-        if (c.reported) {
-            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
-            EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Invalid z26 Path");
-        } else {
-            EXPECT_TRUE(app.fake.dialogs.boxes.empty());
-        }
+        EXPECT_EQ(boxLines(app.fake.dialogs),
+                  c.reported ? Lines{"Invalid z26 Path | z26 path isn't valid.\n\nTry removing the "
+                                     "z26 path and re-adding it to correct the problem. | Ok | "
+                                     "Exclamation"}
+                             : Lines{});
     }
     EXPECT_TRUE(app.fake.shell.started.empty());
 }

@@ -1,4 +1,5 @@
 #include "AppFixture.h"
+#include "support/Boxes.h"
 
 #include "about/frmAbout.h"
 
@@ -39,10 +40,9 @@ TEST(EmulatorDocuments, FolderOrExecutablePathOpensTheSameReadme) {
             EXPECT_TRUE(app.fake.dialogs.boxes.empty()) << c.stored;
         } else {
             EXPECT_TRUE(app.fake.shell.textFiles.isEmpty()) << c.stored;
-            ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u) << c.stored;
-            EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Error");
-            EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading README.TXT");
-            EXPECT_EQ(app.fake.dialogs.boxes[0].icon, MsgIcon::Exclamation);
+            EXPECT_EQ(boxLines(app.fake.dialogs),
+                      Lines{"Error | Error loading README.TXT | Ok | Exclamation"})
+                << c.stored;
         }
     }
 }
@@ -57,8 +57,8 @@ TEST(EmulatorDocuments, CopyingFindsALowerCaseNameAndReportsAFailedOpen) {
     EXPECT_EQ(app.fake.shell.textFiles, QStringList{copying});
     app.fake.shell.succeed = false;
     w.mnuAboutCopying->trigger();
-    ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(app.fake.dialogs.boxes[0].text, "Error loading COPYING.TXT");
+    EXPECT_EQ(boxLines(app.fake.dialogs),
+              Lines{"Error | Error loading COPYING.TXT | Ok | Exclamation"});
 }
 
 TEST(MainMenuCommands, HomePagesAndAboutOpen) {

@@ -14,9 +14,6 @@
 
 namespace {
 
-const QString kCorruptBox =
-    ".lum file is corrupt\r\nPlease verify settings and re-save to correct this problem";
-
 // A valid option set that differs from the settings window's start.
 ConfigRecord sampleRecord() {
     ConfigRecord r;
@@ -29,68 +26,7 @@ ConfigRecord sampleRecord() {
     return r;
 }
 
-int corruptBoxes(const AppFixture& app) {
-    int count = 0;
-    for (const FakeDialogs::Box& box : app.fake.dialogs.boxes)
-        count += box.text == kCorruptBox;
-    return count;
-}
-
-// Both paths known, so that the start-up goes straight to the list.
-void storePaths(AppFixture& app) {
-    app.fake.store.SaveSetting("Settings", "Z26Path", app.fake.root());
-    app.storeFolder(1, app.romFolder("roms", {"a.bin"}));
-}
-
 } // namespace
-
-TEST(DefaultLumAtStart, CaptionSaysHowTheLoadWent) {
-    QByteArray corrupt = sampleRecord().encode();
-    corrupt[14] = 3; // a check box state that does not exist
-    const struct {
-        const char* name;
-        std::optional<QByteArray> file;
-        const char* caption;
-        const char* toolTip;
-        int boxes;
-    } cases[] = {
-        {"absent", std::nullopt, "Default.lum couldn't be loaded",
-         "Default.lum need's to be in the same folder as lum.exe", 0},
-        {"valid", sampleRecord().encode(), "Default.lum was succesfully loaded", "", 0},
-        {"corrupt", corrupt,
-         "Default.lum is corrupt.  Please verify settings and re-save to correct the problem.", "",
-         1},
-        {"short", sampleRecord().encode().left(100),
-         "Default.lum is corrupt.  Please verify settings and re-save to correct the problem.", "",
-         1},
-    };
-    for (const auto& c : cases) {
-        AppFixture app;
-        storePaths(app);
-        if (c.file)
-            app.fake.writeFile("program/Default.lum", *c.file);
-        frmMain& w = app.load();
-        frmSettings& settings = w.settingsWindow();
-        EXPECT_EQ(settings.lblConfig->text(), c.caption) << c.name;
-        EXPECT_EQ(settings.lblConfig->toolTip(), c.toolTip) << c.name;
-        EXPECT_EQ(corruptBoxes(app), c.boxes) << c.name;
-        // A good file loads without showing the window; a corrupt one shows its first tab.
-        EXPECT_EQ(settings.isVisible(), c.boxes != 0) << c.name;
-        if (c.boxes != 0) {
-            EXPECT_EQ(settings.SelectedTabKey(), "Settings") << c.name;
-        }
-    }
-}
-
-TEST(DefaultLumAtStart, SetsTheStartOptions) {
-    AppFixture app;
-    app.fake.writeFile("program/Default.lum", sampleRecord().encode());
-    frmSettings& settings = app.load().settingsWindow();
-    EXPECT_EQ(settings.comboGT->currentIndex(), 5);
-    EXPECT_TRUE(settings.optCPPAL->isChecked());
-    EXPECT_TRUE(settings.lblDOSOutput->text().contains("-g5"));
-    EXPECT_TRUE(settings.lblDOSOutput->text().contains("-p4"));
-}
 
 TEST(DefaultLumAtStart, FileMenuSavesAndLoadsOptionSets) {
     AppFixture app;
@@ -129,7 +65,7 @@ TEST(DefaultLumAtStart, TheSettingsWindowIsBuiltOnFirstUseWithTheStartOptions) {
     };
     {
         AppFixture app;
-        storePaths(app);
+        app.storePaths();
         app.fake.writeFile("program/Default.lum", sampleRecord().encode());
         app.fake.store.SaveSetting("Settings", "BackColor", "255");
         frmMain& w = app.load();
@@ -139,11 +75,14 @@ TEST(DefaultLumAtStart, TheSettingsWindowIsBuiltOnFirstUseWithTheStartOptions) {
         frmSettings& settings = w.settingsWindow();
         EXPECT_EQ(settingsWindows(), 1);
         EXPECT_EQ(settings.comboGT->currentIndex(), 5);
+        EXPECT_TRUE(settings.optCPPAL->isChecked());
+        EXPECT_TRUE(settings.lblDOSOutput->text().contains("-g5"));
+        EXPECT_TRUE(settings.lblDOSOutput->text().contains("-p4"));
         EXPECT_EQ(settings.lblConfig->text(), "Default.lum was succesfully loaded");
         EXPECT_EQ(settings.BarColorPhos->BarColor(), 255u); // the list's colours, as at start
     }
     AppFixture app;
-    storePaths(app);
+    app.storePaths();
     app.load().close();
     EXPECT_EQ(app.fake.store.GetSetting("setpos", "top"), "");
     EXPECT_EQ(settingsWindows(), 0);

@@ -1,4 +1,5 @@
 #include "AppFixture.h"
+#include "support/Boxes.h"
 
 #include "library/RomListModel.h"
 #include "platform/SettingsStore.h"
@@ -15,54 +16,25 @@
 
 #include <gtest/gtest.h>
 
-TEST(MainWindowStart, FirstRunAsksForTheEmulatorAndOpensDefaultPaths) {
-    AppFixture app;
-    frmMain& w = app.load();
-    ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Choose z26 Path");
-    EXPECT_EQ(app.fake.dialogs.boxes[0].text,
-              "You need to select you z26 path before you continue.");
-    EXPECT_EQ(app.fake.dialogs.boxes[0].buttons, MsgButtons::Ok);
-    EXPECT_TRUE(w.settingsWindow().isVisible());
-    EXPECT_EQ(w.settingsWindow().SelectedTabKey(), "DefaultPaths");
-    EXPECT_EQ(w.listModel().columnCount(), 0);
-    EXPECT_EQ(w.windowTitle(), "lum"); // no refresh ran
-}
-
-TEST(MainWindowStart, EmulatorKnownButNoRomFolderAsksOnlyForTheFolder) {
-    AppFixture app;
-    app.fake.store.SaveSetting("Settings", "Z26Path", app.fake.root());
-    frmMain& w = app.load();
-    ASSERT_EQ(app.fake.dialogs.boxes.size(), 1u);
-    EXPECT_EQ(app.fake.dialogs.boxes[0].title, "Choose ROM's Path");
-    EXPECT_EQ(app.fake.dialogs.boxes[0].text,
-              "You need to select you ROM's path before you continue.");
-    EXPECT_EQ(w.settingsWindow().SelectedTabKey(), "DefaultPaths");
-}
-
-TEST(MainWindowStart, BothPathsKnownAddsTheColumnsAndFillsTheList) {
-    AppFixture app;
-    app.fake.store.SaveSetting("Settings", "Z26Path", app.fake.root());
-    app.fake.store.SaveSetting("Settings", "ROMFilter", "*.bin");
-    app.storeFolder(1, app.romFolder("roms", {"a.bin", "b.bin", "c.txt"}));
-    frmMain& w = app.load();
-    EXPECT_TRUE(app.fake.dialogs.boxes.empty());
-    EXPECT_FALSE(w.settingsWindow().isVisible());
-    ASSERT_EQ(w.listModel().columnCount(), 2);
-    EXPECT_EQ(w.listModel().headerData(0, Qt::Horizontal, Qt::DisplayRole), "Name");
-    EXPECT_EQ(w.listModel().headerData(0, Qt::Horizontal, Qt::ToolTipRole), "ROM Name");
-    EXPECT_EQ(w.listModel().headerData(1, Qt::Horizontal, Qt::DisplayRole), "Path");
-    EXPECT_EQ(w.listModel().headerData(1, Qt::Horizontal, Qt::ToolTipRole), "ROM Path");
-    EXPECT_EQ(w.windowTitle(), "lum - 2 ROM's Found");
-    EXPECT_FALSE(w.m_bInitialLoad);
-}
-
-TEST(MainWindowStart, MissingDefaultOptionSetIsReportedInTheSettingsWindow) {
-    AppFixture app;
-    frmMain& w = app.load();
-    EXPECT_EQ(w.settingsWindow().lblConfig->text(), "Default.lum couldn't be loaded");
-    EXPECT_EQ(w.settingsWindow().lblConfig->toolTip(),
-              "Default.lum need's to be in the same folder as lum.exe");
+// A start without the emulator or without ROM folders asks for the first one missing and
+// opens Default Paths instead of filling the list.
+TEST(MainWindowStart, AMissingPathIsAskedForAndDefaultPathsOpens) {
+    for (const bool emulatorKnown : {false, true}) {
+        SCOPED_TRACE(emulatorKnown);
+        AppFixture app;
+        if (emulatorKnown)
+            app.fake.store.SaveSetting("Settings", "Z26Path", app.fake.root());
+        frmMain& w = app.load();
+        EXPECT_EQ(boxLines(app.fake.dialogs),
+                  Lines{emulatorKnown ? "Choose ROM's Path | You need to select you ROM's path "
+                                        "before you continue. | Ok | None"
+                                      : "Choose z26 Path | You need to select you z26 path before "
+                                        "you continue. | Ok | None"});
+        EXPECT_TRUE(w.settingsWindow().isVisible());
+        EXPECT_EQ(w.settingsWindow().SelectedTabKey(), "DefaultPaths");
+        EXPECT_EQ(w.listModel().columnCount(), 0);
+        EXPECT_EQ(w.windowTitle(), "lum"); // no refresh ran
+    }
 }
 
 TEST(MainWindowPlacement, RestoresAndStoresThePlacementInTwips) {

@@ -41,9 +41,20 @@ protected:
 
 } // namespace
 
+// With both paths known the start adds the columns and fills the list without a word.
 TEST_F(RefreshTest, CaptionsCountRowsInBothModes) {
-    app.storeFolder(1, app.romFolder("roms", {"Pac-Man.bin", "Pitfall.bin", "Combat.bin"}));
+    app.storeFolder(1,
+                    app.romFolder("roms", {"Pac-Man.bin", "Pitfall.bin", "Combat.bin", "c.txt"}));
     frmMain& w = app.load();
+    EXPECT_TRUE(app.fake.dialogs.boxes.empty());
+    EXPECT_FALSE(w.settingsWindow().isVisible());
+    EXPECT_FALSE(w.m_bInitialLoad);
+    const QAbstractItemModel& model = w.listModel();
+    ASSERT_EQ(model.columnCount(), 2);
+    EXPECT_EQ(model.headerData(0, Qt::Horizontal, Qt::DisplayRole), "Name");
+    EXPECT_EQ(model.headerData(0, Qt::Horizontal, Qt::ToolTipRole), "ROM Name");
+    EXPECT_EQ(model.headerData(1, Qt::Horizontal, Qt::DisplayRole), "Path");
+    EXPECT_EQ(model.headerData(1, Qt::Horizontal, Qt::ToolTipRole), "ROM Path");
     EXPECT_EQ(w.windowTitle(), "lum - 3 ROM's Found");
     search("pit");
     EXPECT_EQ(w.windowTitle(), "lum - 1 Match out of 3");
@@ -57,53 +68,25 @@ TEST_F(RefreshTest, CaptionsCountRowsInBothModes) {
     EXPECT_TRUE(w.txtSearch->hasFocus() || !w.isActiveWindow());
 }
 
-TEST_F(RefreshTest, OneAndNoRowsAtStartUp) {
-    app.storeFolder(1, app.romFolder("one", {"Solo.bin"}));
-    EXPECT_EQ(app.load().windowTitle(), "lum - 1 ROM Found");
-
-    AppFixture empty;
-    empty.fake.store.SaveSetting("Settings", "Z26Path", empty.fake.root());
-    empty.storeFolder(1, empty.romFolder("none", {"readme.txt"}));
-    empty.fake.store.SaveSetting("Settings", "ROMFilter", "*.bin");
-    EXPECT_EQ(empty.load().windowTitle(), "lum - 0 ROM's Found");
-}
-
-TEST_F(RefreshTest, DisabledFolderBetweenEnabledOnesIsNeitherCountedNorListed) {
-    app.storeFolder(1, app.romFolder("first", {"a.bin"}));
-    app.storeFolder(2, app.romFolder("second", {"b.bin", "c.bin"}), false);
-    app.storeFolder(3, app.romFolder("third", {"d.bin"}));
-    frmMain& w = app.load();
-    EXPECT_EQ(names(), (QStringList{"a.bin", "d.bin"}));
-    search("bin");
-    EXPECT_EQ(w.windowTitle(), "lum - 2 Matches out of 2");
-    EXPECT_EQ(w.vbalProgressBar1->Value(), 2); // the bar ends at the total
-    EXPECT_EQ(w.vbalProgressBar1->Max(), 2);
-}
-
-TEST_F(RefreshTest, AnEmptyPathEndsTheFolderList) {
-    app.storeFolder(1, app.romFolder("first", {"a.bin"}));
-    app.storeFolder(2, QString());
-    app.storeFolder(3, app.romFolder("third", {"d.bin"}));
-    app.load();
-    EXPECT_EQ(names(), QStringList{"a.bin"});
-}
-
-TEST_F(RefreshTest, SameNameInTwoFoldersGivesTwoRowsWithTheirOwnFolders) {
-    const QString first = app.romFolder("first", {"Combat.bin"});
-    const QString second = app.romFolder("second", {"Combat.bin", "Adventure.bin"});
+// Folders are listed in their order, each with its own path; a disabled one is skipped and
+// the first empty path ends the list.
+TEST_F(RefreshTest, EnabledFoldersUpToTheFirstEmptyPathAreListedInOrder) {
+    const QString first = app.romFolder("first", {"Combat.bin", "a.bin"});
+    const QString third = app.romFolder("third", {"d.bin", "Combat.bin"});
     app.storeFolder(1, first);
-    app.storeFolder(2, second);
+    app.storeFolder(2, app.romFolder("second", {"b.bin"}), false);
+    app.storeFolder(3, third);
+    app.storeFolder(4, QString());
+    app.storeFolder(5, app.romFolder("fifth", {"e.bin"}));
     frmMain& w = app.load();
-    ASSERT_EQ(names(), (QStringList{"Combat.bin", "Adventure.bin", "Combat.bin"}));
-    EXPECT_EQ(w.listModel().rowPath(0), first + "/Combat.bin");
-    EXPECT_EQ(w.listModel().rowPath(2), second + "/Combat.bin");
-    EXPECT_EQ(w.listModel().data(w.listModel().index(2, 1), Qt::DisplayRole).toString(), second);
-}
-
-TEST_F(RefreshTest, AMissingFolderListsNothingAndStopsNothing) {
-    app.storeFolder(1, app.fake.root() + "/gone");
-    app.storeFolder(2, app.romFolder("here", {"x.bin"}));
-    EXPECT_EQ(app.load().windowTitle(), "lum - 1 ROM Found");
+    ASSERT_EQ(names(), (QStringList{"a.bin", "Combat.bin", "Combat.bin", "d.bin"}));
+    EXPECT_EQ(w.listModel().rowPath(1), first + "/Combat.bin");
+    EXPECT_EQ(w.listModel().rowPath(2), third + "/Combat.bin");
+    EXPECT_EQ(w.listModel().data(w.listModel().index(2, 1), Qt::DisplayRole).toString(), third);
+    search("bin");
+    EXPECT_EQ(w.windowTitle(), "lum - 4 Matches out of 4");
+    EXPECT_EQ(w.vbalProgressBar1->Value(), 4); // the bar ends at the total
+    EXPECT_EQ(w.vbalProgressBar1->Max(), 4);
 }
 
 TEST_F(RefreshTest, ThePatternComesFromTheSettingsWindow) {
