@@ -56,8 +56,6 @@ protected:
 TEST_F(Crc32Test, CheckValueComesBackAsTheNegativeNumberWithTheSameBits) {
     const qint32 crc = crcOfFile("123456789");
     EXPECT_EQ(crc, static_cast<qint32>(0xCBF43926u));
-    EXPECT_LT(crc, 0);
-    EXPECT_EQ(crc, -873187034);
     // Nothing carries over: the same file again gives the same value.
     EXPECT_EQ(m_crc.GetCRCFromFile(), crc);
     EXPECT_TRUE(m_fake.dialogs.boxes.empty());
@@ -142,9 +140,6 @@ TEST_F(Crc32Test, StringsAreChecksummedAsUtf16LittleEndian) {
         ASSERT_FALSE(m_progress.empty());
         EXPECT_EQ(m_progress.back(), 1.0f);
     }
-    EXPECT_EQ(m_crc.GetCRCFromString(QString()), 0);
-    EXPECT_NE(m_crc.GetCRCFromString(QStringLiteral("abc")),
-              static_cast<qint32>(referenceCrc("abc")));
 }
 
 // What cannot be read gives 0 and one box naming the fault; a missing file is not created
