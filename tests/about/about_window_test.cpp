@@ -1,5 +1,5 @@
-#include "support/LocalHttpServer.h"
 #include "support/Boxes.h"
+#include "support/LocalHttpServer.h"
 
 #include "about/AboutArt.h"
 #include "about/AboutRules.h"
