@@ -88,16 +88,29 @@ std::optional<double> wholeDecimalNumber(QStringView text) {
     return convert(text.mid(start, length));
 }
 
-QString shortestDecimalText(float value) {
-    if (!std::isfinite(value) || value == 0.0f)
+namespace {
+
+template <typename Number> QString shortestText(Number value) {
+    if (!std::isfinite(value) || value == Number(0))
         return QStringLiteral("0");
     char buffer[64];
-    const float magnitude = std::fabs(value);
-    const bool plain = magnitude >= 1e-5f && magnitude < 1e15f;
+    const Number magnitude = std::fabs(value);
+    // Digits without an exponent wherever a person would write them so.
+    const bool plain = magnitude >= Number(1e-5) && magnitude < Number(1e15);
     const std::to_chars_result r =
         plain ? std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed)
               : std::to_chars(buffer, buffer + sizeof buffer, value);
     if (r.ec != std::errc())
         return QStringLiteral("0");
     return QString::fromLatin1(buffer, r.ptr - buffer);
+}
+
+} // namespace
+
+QString shortestDecimalText(float value) {
+    return shortestText(value);
+}
+
+QString shortestDecimalText(double value) {
+    return shortestText(value);
 }

@@ -25,3 +25,5 @@ std::optional<double> wholeDecimalNumber(QStringView text);
 // plain digits for everyday magnitudes, an exponent only for very large or very small
 // ones ("1e+20"). Minus zero is "0". Not-a-number and infinities give "0".
 QString shortestDecimalText(float value);
+// The same for a double.
+QString shortestDecimalText(double value);

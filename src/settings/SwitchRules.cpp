@@ -2,9 +2,6 @@
 
 #include "emulator/LeadingNumber.h"
 
-#include <charconv>
-#include <cmath>
-
 namespace switches {
 
 const Controller* controllerAt(int index) {
@@ -29,16 +26,7 @@ bool controllerUsesDevice(int index, const QString& device) {
 }
 
 QString numberText(double value) {
-    if (!std::isfinite(value) || value == 0.0)
-        return QStringLiteral("0");
-    char buffer[64];
-    const double magnitude = std::fabs(value);
-    // Digits without an exponent wherever a person would write them so.
-    const bool bPlain = magnitude >= 1e-5 && magnitude < 1e15;
-    const std::to_chars_result r =
-        bPlain ? std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed)
-               : std::to_chars(buffer, buffer + sizeof buffer, value);
-    return QString::fromLatin1(buffer, r.ptr - buffer);
+    return shortestDecimalText(value);
 }
 
 QString normalisedNumberText(QStringView text) {
