@@ -339,6 +339,17 @@ void showSliderTexts(const frmSettings& w) {
     w.BarColorPhos->setText(sliders::PlainText(w.BarColorPhos->Value()));
 }
 
+// The option-set chooser of both buttons, opening in the program folder.
+FileDialogRequest optionSetRequest(const QString& programFolder, unsigned flags) {
+    FileDialogRequest request;
+    request.title = kDialogTitle;
+    request.filter = kDialogFilter;
+    request.filterIndex = 1;
+    request.initialFolder = programFolder;
+    request.flags = flags;
+    return request;
+}
+
 } // namespace
 
 void frmSettings::connectConfigControls() {
@@ -391,13 +402,8 @@ bool frmSettings::reportCorruptOptionSet() {
 }
 
 void frmSettings::cmdSaveDat_Click() {
-    FileDialogRequest request;
-    request.title = kDialogTitle;
-    request.filter = kDialogFilter;
-    request.filterIndex = 1;
-    request.initialFolder = m_platform.programFolder;
-    request.flags = kFlagOverwritePrompt;
-    const QString chosen = m_platform.dialogs.ShowSave(this, request);
+    const QString chosen = m_platform.dialogs.ShowSave(
+        this, optionSetRequest(m_platform.programFolder, kFlagOverwritePrompt));
     if (chosen.isEmpty())
         return;
 
@@ -423,13 +429,8 @@ void frmSettings::cmdSaveDat_Click() {
 }
 
 void frmSettings::cmdLoadDat_Click() {
-    FileDialogRequest request;
-    request.title = kDialogTitle;
-    request.filter = kDialogFilter;
-    request.filterIndex = 1;
-    request.initialFolder = m_platform.programFolder;
-    request.flags = kFlagPathMustExist | kFlagFileMustExist;
-    const QString path = m_platform.dialogs.ShowOpen(this, request);
+    const QString path = m_platform.dialogs.ShowOpen(
+        this, optionSetRequest(m_platform.programFolder, kFlagPathMustExist | kFlagFileMustExist));
     if (path.isEmpty())
         return;
 
