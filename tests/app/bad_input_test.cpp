@@ -12,12 +12,10 @@
 #include "ui/Twips.h"
 #include "ui/vbalProgressBar.h"
 
-#include <QBuffer>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QGuiApplication>
-#include <QImage>
 #include <QLabel>
 #include <QMenu>
 #include <QScreen>
@@ -31,13 +29,7 @@ namespace {
 const QString kSettings = QStringLiteral("Settings");
 
 QByteArray png(int width, int height) {
-    QImage image(width, height, QImage::Format_RGB32);
-    image.fill(Qt::darkCyan);
-    QByteArray bytes;
-    QBuffer buffer(&bytes);
-    buffer.open(QIODevice::WriteOnly);
-    image.save(&buffer, "PNG");
-    return bytes;
+    return encodedPicture(width, height, "PNG");
 }
 
 // A PNG header that claims a picture of the given size, with no picture data after it.

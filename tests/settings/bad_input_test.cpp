@@ -1,11 +1,11 @@
 #include "support/FakePlatform.h"
+#include "support/Files.h"
 #include "support/Unreadable.h"
 
 #include "platform/SettingsStore.h"
 #include "settings/frmPicPreview.h"
 #include "settings/frmSettings.h"
 
-#include <QBuffer>
 #include <QComboBox>
 #include <QCoreApplication>
 #include <QDragEnterEvent>
@@ -13,7 +13,6 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QGuiApplication>
-#include <QImage>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMimeData>
@@ -170,11 +169,6 @@ QByteArray sampleOptionSet(FakePlatform& fake) {
     return file.readAll();
 }
 
-QByteArray fileBytes(const QString& path) {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<unreadable>");
-}
-
 } // namespace
 
 // Option sets in every bad shape through the Load button: the caption and the one message
@@ -312,13 +306,7 @@ TEST(BadInputOptionSets, TheSaveButtonReplacesOrReportsEveryShape) {
 namespace {
 
 QByteArray jpeg(int width, int height) {
-    QImage image(width, height, QImage::Format_RGB32);
-    image.fill(Qt::darkCyan);
-    QByteArray bytes;
-    QBuffer buffer(&bytes);
-    buffer.open(QIODevice::WriteOnly);
-    image.save(&buffer, "JPG");
-    return bytes;
+    return encodedPicture(width, height, "JPG");
 }
 
 // A JPEG whose frame header claims the given size; the picture data after it is cut.
