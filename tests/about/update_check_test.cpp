@@ -1,4 +1,5 @@
 #include "support/Boxes.h"
+#include "support/Files.h"
 #include "support/LocalHttpServer.h"
 
 #include "about/UpdateCheck.h"
@@ -16,11 +17,6 @@ const QString kInstaller = QStringLiteral("/files/setup.run");
 const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
 const std::string kAsk = "Update available | Version 1.1.13 released June 2nd is available.\n\n"
                          "Do you wish to update now? | YesNoCancel | None";
-
-QByteArray readAll(const QString& path) {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
-}
 
 class UpdateCheckTest : public ::testing::Test {
 protected:
@@ -91,7 +87,7 @@ TEST_F(UpdateCheckTest, VersionsAreComparedAndOnlyYesDownloads) {
     EXPECT_FALSE(server.requests.contains(kInstaller));
     EXPECT_FALSE(QFileInfo::exists(updateFolder()));
     // The local copy of the description stays in the program folder.
-    EXPECT_TRUE(readAll(fake.programFolder() + "/tmp").startsWith("::Other"));
+    EXPECT_TRUE(fileBytes(fake.programFolder() + "/tmp").startsWith("::Other"));
 }
 
 TEST_F(UpdateCheckTest, DownloadAndKeepReplacingAnOlderInstaller) {
@@ -106,7 +102,7 @@ TEST_F(UpdateCheckTest, DownloadAndKeepReplacingAnOlderInstaller) {
     fake.writeFile("program/Update/setup.run", "OLD");
     server.serve(kInstaller, "INSTALLER");
     EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
-    EXPECT_EQ(readAll(installerPath()), "INSTALLER");
+    EXPECT_EQ(fileBytes(installerPath()), "INSTALLER");
     EXPECT_EQ(takeBoxes(),
               (Lines{kAsk, "Download Complete | The update has been downloaded to " +
                                QDir::toNativeSeparators(installerPath()).toStdString() +
