@@ -5,7 +5,6 @@
 #include "about/UpdateCheck.h"
 
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
 
 #include <gtest/gtest.h>
