@@ -3,9 +3,13 @@
 #include <QFile>
 
 #include <algorithm>
+#include <condition_variable>
 #include <cstdint>
+#include <deque>
+#include <future>
 #include <memory>
-#include <numeric>
+#include <mutex>
+#include <optional>
 
 #include <dirent.h>
 #include <sys/stat.h>
@@ -55,6 +59,178 @@ QString foldCase(QStringView s) {
     return s.toString().toCaseFolded();
 }
 
+// The first eight bytes of a key from `from` on, big-endian, zero-padded: comparing two of
+// these compares those bytes as memcmp would, and most comparisons end there.
+std::uint64_t bigEndianPrefix(std::string_view key, size_t from) {
+    std::uint64_t prefix = 0;
+    for (size_t i = from; i < from + 8; ++i)
+        prefix = (prefix << 8) | (i < key.size() ? static_cast<unsigned char>(key[i]) : 0u);
+    return prefix;
+}
+
+// Names as they come out of the folder, each followed by a NUL (which no name holds).
+struct NameBatch {
+    std::string names;
+    size_t count = 0;
+};
+
+// Hands batches of names from the thread reading the folder to the one matching them.
+class BatchQueue {
+public:
+    void push(NameBatch batch) {
+        {
+            std::lock_guard lock(m_mutex);
+            m_batches.push_back(std::move(batch));
+        }
+        m_ready.notify_one();
+    }
+    void close() {
+        {
+            std::lock_guard lock(m_mutex);
+            m_closed = true;
+        }
+        m_ready.notify_one();
+    }
+    // The next batch, or nothing once the queue is closed and empty.
+    std::optional<NameBatch> pop() {
+        std::unique_lock lock(m_mutex);
+        m_ready.wait(lock, [this] { return m_closed || !m_batches.empty(); });
+        if (m_batches.empty())
+            return std::nullopt;
+        NameBatch batch = std::move(m_batches.front());
+        m_batches.pop_front();
+        return batch;
+    }
+
+private:
+    std::mutex m_mutex;
+    std::condition_variable m_ready;
+    std::deque<NameBatch> m_batches;
+    bool m_closed = false;
+};
+
+QString decodeName(std::string_view name) {
+    const auto size = static_cast<qsizetype>(name.size());
+    return isAscii(name) ? QString::fromLatin1(name.data(), size)
+                         : QFile::decodeName(QByteArray(name.data(), size));
+}
+
+struct SortEntry {
+    std::uint64_t prefix0, prefix1; // the key's first sixteen bytes
+    const char* key;
+    const char* name;
+    std::uint32_t keySize, nameSize;
+    std::uint32_t index; // of the name's QString
+    std::string_view keyView() const { return {key, keySize}; }
+    std::string_view nameView() const { return {name, nameSize}; }
+};
+
+// The matching names of every batch: their sort keys (case-folded UTF-8, which for plain
+// ASCII names is just their lower-case bytes) and their QStrings, made once each.
+class MatchedNames {
+public:
+    explicit MatchedNames(const FilePattern& pattern) : m_pattern(pattern) {}
+
+    void add(NameBatch batch) {
+        if (batch.count == 0)
+            return;
+        const std::string& raw = m_batchStore.emplace_back(std::move(batch.names));
+        std::string& keys = m_keyStore.emplace_back();
+        keys.reserve(raw.size());
+        // Keys are placed by offset while their buffer may still grow, then pinned down.
+        std::vector<std::pair<size_t, size_t>> keySpans;
+        const size_t first = m_entries.size();
+        for (size_t at = 0; at < raw.size();) {
+            const std::string_view name(raw.data() + at);
+            at += name.size() + 1;
+            const size_t keyStart = keys.size();
+            QString decoded;
+            if (m_pattern.asciiOnly() && isAscii(name)) {
+                keys.resize(keyStart + name.size());
+                std::transform(
+                    name.begin(), name.end(), keys.begin() + static_cast<std::ptrdiff_t>(keyStart),
+                    [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; });
+                if (!m_pattern.matchesFoldedAscii(std::string_view(keys).substr(keyStart))) {
+                    keys.resize(keyStart);
+                    continue;
+                }
+                decoded = QString::fromLatin1(name.data(), static_cast<qsizetype>(name.size()));
+            } else {
+                decoded = decodeName(name);
+                if (!m_pattern.matches(decoded))
+                    continue;
+                keys += foldCase(decoded).toStdString();
+            }
+            keySpans.emplace_back(keyStart, keys.size() - keyStart);
+            m_entries.push_back({0, 0, nullptr, name.data(), 0,
+                                 static_cast<std::uint32_t>(name.size()),
+                                 static_cast<std::uint32_t>(m_names.size())});
+            m_names.push_back(std::move(decoded));
+        }
+        for (size_t i = 0; i < keySpans.size(); ++i) {
+            SortEntry& e = m_entries[first + i];
+            const std::string_view key =
+                std::string_view(keys).substr(keySpans[i].first, keySpans[i].second);
+            e.prefix0 = bigEndianPrefix(key, 0);
+            e.prefix1 = bigEndianPrefix(key, 8);
+            e.key = key.data();
+            e.keySize = static_cast<std::uint32_t>(key.size());
+        }
+        // Each batch becomes a sorted run, and runs of like length are merged as they come,
+        // so that little of the sorting is left once the folder has been read.
+        std::sort(m_entries.begin() + static_cast<std::ptrdiff_t>(first), m_entries.end(), less);
+        m_runStarts.push_back(first);
+        while (m_runStarts.size() >= 2 &&
+               runLength(m_runStarts.size() - 2) <= runLength(m_runStarts.size() - 1))
+            mergeTopRuns();
+    }
+
+    // Sorted by the folded name; equal keys keep a stable, case-sensitive order.
+    QStringList takeSorted() {
+        while (m_runStarts.size() >= 2)
+            mergeTopRuns();
+        QStringList sorted;
+        sorted.reserve(static_cast<qsizetype>(m_entries.size()));
+        for (const SortEntry& e : m_entries)
+            sorted.push_back(std::move(m_names[e.index]));
+        return sorted;
+    }
+
+private:
+    static bool less(const SortEntry& a, const SortEntry& b) {
+        if (a.prefix0 != b.prefix0)
+            return a.prefix0 < b.prefix0;
+        if (a.prefix1 != b.prefix1)
+            return a.prefix1 < b.prefix1;
+        const int c = a.keyView().compare(b.keyView());
+        if (c != 0)
+            return c < 0;
+        return a.nameView() < b.nameView();
+    }
+
+    size_t runLength(size_t run) const {
+        const size_t end = run + 1 < m_runStarts.size() ? m_runStarts[run + 1] : m_entries.size();
+        return end - m_runStarts[run];
+    }
+
+    // Runs lie side by side in the entries, so the last two merge in place.
+    void mergeTopRuns() {
+        const auto at = [this](size_t i) {
+            return m_entries.begin() + static_cast<std::ptrdiff_t>(i);
+        };
+        const size_t top = m_runStarts.back();
+        m_runStarts.pop_back();
+        std::inplace_merge(at(m_runStarts.back()), at(top), m_entries.end(), less);
+    }
+
+    const FilePattern& m_pattern;
+    std::deque<std::string> m_batchStore; // the entries point into these two
+    std::deque<std::string> m_keyStore;
+    std::vector<SortEntry> m_entries;
+    std::vector<size_t> m_runStarts; // the sorted runs still to merge, in order
+    std::vector<QString> m_names;
+};
+
 } // namespace
 
 FilePattern::FilePattern(const QString& pattern) : m_text(pattern) {
@@ -66,9 +242,22 @@ FilePattern::FilePattern(const QString& pattern) : m_text(pattern) {
     }
     m_asciiOnly = std::all_of(m_wildcards.begin(), m_wildcards.end(),
                               [](const QString& w) { return isAscii(QStringView(w)); });
-    if (m_asciiOnly)
-        for (const QString& w : m_wildcards)
-            m_asciiWildcards.push_back(w.toStdString());
+    if (!m_asciiOnly)
+        return;
+    for (const QString& w : m_wildcards) {
+        const std::string text = w.toStdString();
+        const auto plain = [](std::string_view t) {
+            return t.find_first_of("*?") == std::string_view::npos;
+        };
+        if (text == "*")
+            m_asciiWildcards.push_back({AsciiWildcard::Any, {}});
+        else if (text.front() == '*' && plain(std::string_view(text).substr(1)))
+            m_asciiWildcards.push_back({AsciiWildcard::Suffix, text.substr(1)});
+        else if (plain(text))
+            m_asciiWildcards.push_back({AsciiWildcard::Exact, text});
+        else
+            m_asciiWildcards.push_back({AsciiWildcard::General, text});
+    }
 }
 
 bool FilePattern::matches(QStringView name) const {
@@ -79,31 +268,59 @@ bool FilePattern::matches(QStringView name) const {
 }
 
 bool FilePattern::matchesFoldedAscii(std::string_view foldedName) const {
-    return std::any_of(m_asciiWildcards.begin(), m_asciiWildcards.end(), [&](const std::string& w) {
-        return wildcardMatch(std::string_view(w), foldedName);
-    });
+    return std::any_of(
+        m_asciiWildcards.begin(), m_asciiWildcards.end(), [&](const AsciiWildcard& w) {
+            switch (w.shape) {
+            case AsciiWildcard::Any:
+                return true;
+            case AsciiWildcard::Suffix:
+                return foldedName.size() >= w.text.size() &&
+                       foldedName.substr(foldedName.size() - w.text.size()) == w.text;
+            case AsciiWildcard::Exact:
+                return foldedName == w.text;
+            case AsciiWildcard::General:
+                break;
+            }
+            return wildcardMatch(std::string_view(w.text), foldedName);
+        });
 }
 
 QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
-    QStringList names;
     if (folder.isEmpty())
-        return names;
+        return {};
     const QByteArray native = QFile::encodeName(folder);
     std::unique_ptr<DIR, int (*)(DIR*)> dir(opendir(native.constData()), closedir);
     if (!dir)
-        return names;
+        return {};
     const int dirFd = dirfd(dir.get());
 
-    // Names and their sort keys are gathered as bytes in two buffers; only the names that
-    // match become QStrings, once, after sorting. Keys are the case-folded names in UTF-8,
-    // which for plain ASCII names is just their lower-case bytes.
-    struct Entry {
-        std::uint64_t prefix; // the key's first eight bytes, big-endian: most comparisons end here
-        size_t name, nameSize, key, keySize;
+    // Reading a large folder is mostly the kernel's work, so once a whole batch of names
+    // has come in, another thread matches and decodes them while the rest is read. A small
+    // folder is done here as it is read.
+    constexpr size_t kBatchNames = 4096;
+    MatchedNames matched(pattern);
+    BatchQueue queue;
+    std::future<void> matching;
+    // However this ends, the matching thread is told that no more batches come before the
+    // future waits for it.
+    struct CloseOnExit {
+        BatchQueue& queue;
+        ~CloseOnExit() { queue.close(); }
+    } closeOnExit{queue};
+    const auto deliver = [&](NameBatch& batch) {
+        if (!matching.valid() && batch.count == kBatchNames)
+            matching = std::async(std::launch::async, [&] {
+                while (std::optional<NameBatch> next = queue.pop())
+                    matched.add(std::move(*next));
+            });
+        if (matching.valid())
+            queue.push(std::move(batch));
+        else
+            matched.add(std::move(batch));
+        batch = NameBatch{};
     };
-    std::string rawNames;
-    std::string keys;
-    std::vector<Entry> entries;
+
+    NameBatch batch;
     while (const dirent* entry = readdir(dir.get())) {
         if (entry->d_name[0] == '.')
             continue;
@@ -114,55 +331,17 @@ QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern)
         }
         if (!regular)
             continue;
-        const std::string_view raw(entry->d_name);
-        const size_t keyStart = keys.size();
-        bool match = false;
-        if (pattern.asciiOnly() && isAscii(raw)) {
-            keys.resize(keyStart + raw.size());
-            std::transform(
-                raw.begin(), raw.end(), keys.begin() + static_cast<std::ptrdiff_t>(keyStart),
-                [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; });
-            match = pattern.matchesFoldedAscii(std::string_view(keys).substr(keyStart));
-        } else {
-            const QString name =
-                QFile::decodeName(QByteArray(raw.data(), static_cast<qsizetype>(raw.size())));
-            match = pattern.matches(name);
-            if (match)
-                keys += foldCase(name).toStdString();
-        }
-        if (!match) {
-            keys.resize(keyStart);
-            continue;
-        }
-        std::uint64_t prefix = 0;
-        for (size_t i = 0; i < 8; ++i)
-            prefix =
-                (prefix << 8) |
-                (keyStart + i < keys.size() ? static_cast<unsigned char>(keys[keyStart + i]) : 0u);
-        entries.push_back({prefix, rawNames.size(), raw.size(), keyStart, keys.size() - keyStart});
-        rawNames += raw;
+        batch.names.append(entry->d_name).push_back('\0');
+        if (++batch.count == kBatchNames)
+            deliver(batch);
     }
-
-    const std::string_view allNames(rawNames);
-    const std::string_view allKeys(keys);
-    // Sort by the folded name; equal keys keep a stable, case-sensitive order.
-    std::sort(entries.begin(), entries.end(), [&](const Entry& a, const Entry& b) {
-        if (a.prefix != b.prefix)
-            return a.prefix < b.prefix;
-        const int c = allKeys.substr(a.key, a.keySize).compare(allKeys.substr(b.key, b.keySize));
-        if (c != 0)
-            return c < 0;
-        return allNames.substr(a.name, a.nameSize) < allNames.substr(b.name, b.nameSize);
-    });
-    names.reserve(static_cast<qsizetype>(entries.size()));
-    for (const Entry& e : entries) {
-        const char* data = rawNames.data() + e.name;
-        const auto size = static_cast<qsizetype>(e.nameSize);
-        names.push_back(isAscii(allNames.substr(e.name, e.nameSize))
-                            ? QString::fromLatin1(data, size)
-                            : QFile::decodeName(QByteArray(data, size)));
+    dir.reset();
+    deliver(batch);
+    if (matching.valid()) {
+        queue.close();
+        matching.get();
     }
-    return names;
+    return matched.takeSorted();
 }
 
 void FileLister::setPattern(const QString& pattern) {

@@ -22,7 +22,13 @@ public:
 private:
     QString m_text;
     std::vector<QString> m_wildcards; // case-folded
-    std::vector<std::string> m_asciiWildcards;
+    // The ASCII wildcards, each with the shape it has: most are "*.ext", which is just a
+    // check of the name's end.
+    struct AsciiWildcard {
+        enum Shape { Any, Suffix, Exact, General } shape;
+        std::string text; // for Suffix, the part after the star
+    };
+    std::vector<AsciiWildcard> m_asciiWildcards;
     bool m_asciiOnly = true;
 };
 

@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 TEST(FilePattern, WildcardListsIgnoreCase) {
     const FilePattern bins(QStringLiteral("*.bin;*.A26"));
     EXPECT_TRUE(bins.matches(u"Pitfall.BIN"));
@@ -35,4 +37,50 @@ TEST(FileLister, ListsMatchingRegularVisibleFilesSortedWithoutCase) {
     EXPECT_EQ(lister.List(3), "c.BIN");
     EXPECT_EQ(lister.List(4), QString());
     EXPECT_EQ(lister.List(-1), QString());
+}
+
+// Folders are matched name by name through a quicker path for plain ASCII wildcards; it
+// must agree with the general match on every shape of wildcard.
+TEST(FilePattern, TheAsciiPathAgreesWithTheGeneralMatch) {
+    const char* patterns[] = {"*.bin", "*.bin;*.a26", "pitfall.bin", "*",     "*.*", "p?t*.bin",
+                              "*bin",  "bin",         "**.bin",      "*.b?n", "*.",  "*pit*"};
+    const char* names[] = {"pitfall.bin", "x.bin.bak", "bin",   ".bin", "a.bin",    "pitfall.bi",
+                           "combat.a26",  "pt.bin",    "noext", "a.",   "spit.txt", "b"};
+    for (const char* p : patterns) {
+        const FilePattern pattern{QString::fromLatin1(p)};
+        ASSERT_TRUE(pattern.asciiOnly()) << p;
+        for (const char* n : names)
+            EXPECT_EQ(pattern.matchesFoldedAscii(n), pattern.matches(QString::fromLatin1(n)))
+                << p << " against " << n;
+    }
+}
+
+// A folder too large to match in one go is matched on another thread while it is read, in
+// batches that are merged afterwards: the order must be the one a plain sort gives.
+TEST(FileLister, ALargeFolderIsSortedAsOneList) {
+    FakePlatform fake;
+    const QString folder = fake.makeFolder("roms");
+    QStringList expected;
+    // Names that share their first twenty characters, differ only in case, or are not
+    // ASCII, in an order the folder does not keep.
+    for (int i = 0; i < 9000; ++i) {
+        const int n = (i * 7919) % 9000;
+        QString name = n % 3 == 0   ? QStringLiteral("Activision Collection - %1.bin").arg(n)
+                       : n % 3 == 1 ? QStringLiteral("activision collection - %1.BIN").arg(n / 10)
+                                    : QStringLiteral("Émulé %1.bin").arg(n);
+        if (!QFile::exists(folder + u'/' + name)) {
+            fake.writeFile(QStringLiteral("roms/") + name);
+            expected.push_back(name);
+        }
+    }
+    fake.writeFile(QStringLiteral("roms/notes.txt"));
+    std::sort(expected.begin(), expected.end(), [](const QString& a, const QString& b) {
+        const QByteArray ka = a.toCaseFolded().toUtf8(), kb = b.toCaseFolded().toUtf8();
+        return ka != kb ? ka < kb : a.toUtf8() < b.toUtf8();
+    });
+
+    FileLister lister;
+    lister.setPattern("*.bin");
+    lister.setPath(folder);
+    EXPECT_EQ(lister.names(), expected);
 }
