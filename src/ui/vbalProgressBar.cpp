@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace progressbar {
 
@@ -222,17 +223,56 @@ template <typename T> void vbalProgressBar::assign(T& member, const T& value) {
     if (member == value)
         return;
     member = value;
+    ++m_epoch;
     redraw();
 }
 
 void vbalProgressBar::assignRange(int& member, int value) {
     if (member == value)
         return;
-    const QRect before = currentBar();
+    const bool known = memoCurrent();
+    if (known && &member == &m_value && m_barMemo.low <= value && value <= m_barMemo.high) {
+        m_value = value; // the same bar
+        return;
+    }
+    const QRect before = known ? m_barMemo.bar : currentBar();
     member = value;
+    rememberBar();
     // Value, Min and Max show only through the bar's extent.
-    if (currentBar() != before)
+    if (m_barMemo.bar != before)
         redraw();
+}
+
+void vbalProgressBar::rememberBar() {
+    const QRect track = this->track();
+    const bool across = horizontal();
+    const int step = barStep();
+    const auto barAt = [&](long long value) {
+        return progressbar::barRect(
+            track, progressbar::fraction(static_cast<int>(value), m_min, m_max), across, step);
+    };
+    const QRect bar = barAt(m_value);
+    const auto drawsBar = [&](long long value) {
+        return value >= std::numeric_limits<int>::min() &&
+               value <= std::numeric_limits<int>::max() && barAt(value) == bar;
+    };
+    // The last Value in `direction` that still draws this bar: gallop, then halve.
+    const auto spanEnd = [&](int direction) {
+        long long good = m_value;
+        long long bad = good;
+        for (long long jump = 1;; jump *= 2) {
+            bad = good + direction * jump;
+            if (!drawsBar(bad))
+                break;
+            good = bad;
+        }
+        while (bad - good > 1 || good - bad > 1) {
+            const long long mid = good + (bad - good) / 2;
+            (drawsBar(mid) ? good : bad) = mid;
+        }
+        return static_cast<int>(good);
+    };
+    m_barMemo = {m_epoch, size(), spanEnd(-1), spanEnd(+1), bar};
 }
 
 void vbalProgressBar::redraw() {
@@ -314,6 +354,7 @@ void vbalProgressBar::setBarPicture(const QImage& picture) {
     if (picture.cacheKey() == m_bar.picture.cacheKey())
         return;
     m_bar.set(picture);
+    ++m_epoch;
     redraw();
 }
 
@@ -321,6 +362,7 @@ void vbalProgressBar::setPicture(const QImage& picture) {
     if (picture.cacheKey() == m_back.picture.cacheKey())
         return;
     m_back.set(picture);
+    ++m_epoch; // a background picture turns the themed look off
     redraw();
 }
 
@@ -331,6 +373,7 @@ void vbalProgressBar::ModifyBarPicture(double fLuminance, double fSaturation) {
 
 void vbalProgressBar::ModifyPicture(double fLuminance, double fSaturation) {
     m_back.modify(fLuminance, fSaturation);
+    ++m_epoch;
     update();
 }
 
@@ -368,10 +411,13 @@ QRect vbalProgressBar::track() const {
     return m_themedTrack;
 }
 
-QRect vbalProgressBar::currentBar() const {
+int vbalProgressBar::barStep() const {
     // The themed bar is drawn smooth by the style, which splits it into chunks itself.
-    const int step = (m_segments && !themed()) ? 10 : 0;
-    return progressbar::barRect(track(), fraction(), horizontal(), step);
+    return (m_segments && !themed()) ? 10 : 0;
+}
+
+QRect vbalProgressBar::currentBar() const {
+    return progressbar::barRect(track(), fraction(), horizontal(), barStep());
 }
 
 void vbalProgressBar::drawText(QPainter& p, const QRect& r, quint32 ole) const {
@@ -501,6 +547,7 @@ void vbalProgressBar::changeEvent(QEvent* event) {
     case QEvent::StyleChange:
     case QEvent::PaletteChange:
         m_themedTrackFor = QSize();
+        ++m_epoch;
         m_groove = QImage();
         update();
         break;

@@ -8,6 +8,8 @@
 #include <QString>
 #include <QWidget>
 
+#include <cstdint>
+
 class QPainter;
 class QStyleOptionProgressBar;
 
@@ -137,6 +139,7 @@ private:
 
     bool horizontal() const { return width() > height(); }
     bool themed() const { return m_xpStyle && !m_back.has(); }
+    int barStep() const;
     double fraction() const { return progressbar::fraction(m_value, m_min, m_max); }
     // The bar's rectangle as it would be drawn now.
     QRect currentBar() const;
@@ -174,6 +177,20 @@ private:
     PictureHolder m_bar;
     pcMemDC m_memDC;
     QElapsedTimer m_lastRepaint;
+    // The bar's extent only ever grows (or only ever shrinks) as Value moves one way, so
+    // the Values that draw the same bar form one span. It is remembered until the size or
+    // any other property changes (each such change moves the epoch on), so that a long
+    // operation setting Value once per item mostly finds the picture unchanged at once.
+    struct BarMemo {
+        std::uint64_t epoch = ~std::uint64_t{0};
+        QSize size;
+        int low = 1, high = 0; // the span of Values, around Value itself
+        QRect bar;
+    };
+    bool memoCurrent() const { return m_barMemo.epoch == m_epoch && m_barMemo.size == size(); }
+    void rememberBar();
+    BarMemo m_barMemo;
+    std::uint64_t m_epoch = 0;
     // The style's contents area is asked for once per size and style, not once per Value.
     mutable QRect m_themedTrack;
     mutable QSize m_themedTrackFor;

@@ -8,6 +8,7 @@
 #include <gtest/gtest.h>
 
 #include <climits>
+#include <random>
 
 namespace {
 
@@ -250,6 +251,62 @@ TEST(ProgressBar, SetsRepaintAtOnceButOnlyWhenThePictureChanges) {
             QTest::qWait(5);
         EXPECT_LE(counter.paints, 1) << xp;
         EXPECT_EQ(counter.lastPaintedValue, items) << xp;
+    }
+}
+
+// A set of Value works the bar out again only when the bar's end may move, so a redraw must
+// follow every move of the end and no other: whichever way Value goes, and after Min, Max,
+// the size, the border or the segments change what each Value draws.
+TEST(ProgressBar, RedrawsWheneverTheBarsEndMovesAndOnlyThen) {
+    vbalProgressBar bar;
+    plain(bar, 202, 20, 1);
+    bar.setMax(1000);
+    bar.show();
+    PaintCounter counter;
+    bar.installEventFilter(&counter);
+    // The paints since the last call, until a whole frame has passed without one.
+    const auto paintsUntilQuiet = [&counter] {
+        int total = counter.paints;
+        do {
+            counter.paints = 0;
+            QTest::qWait(20);
+            total += counter.paints;
+        } while (counter.paints != 0);
+        return total;
+    };
+    const auto drawn = [&bar](int value) {
+        const QRect inner =
+            progressbar::innerRect(bar.rect(), bar.BorderStyle(), bar.Appearance(), false);
+        return progressbar::barRect(inner, progressbar::fraction(value, bar.Min(), bar.Max()), true,
+                                    bar.Segments() ? 10 : 0);
+    };
+    paintsUntilQuiet();
+    std::mt19937 random(2026);
+    for (int step = 0; step < 60; ++step) {
+        const QRect before = drawn(bar.Value());
+        const int pick = static_cast<int>(random() % 10);
+        if (pick < 6) {
+            // Mostly small moves, which end inside the same span or just past its end.
+            const int jump = pick < 4 ? static_cast<int>(random() % 7) - 3
+                                      : static_cast<int>(random() % 1200) - 600;
+            bar.setValue(bar.Value() + jump);
+        } else if (pick == 6) {
+            bar.setMax(bar.Max() == 1000 ? 700 : 1000);
+        } else if (pick == 7) {
+            bar.setMin(bar.Min() == 0 ? -50 : 0);
+        } else if (pick == 8) {
+            bar.resize(bar.width() == 202 ? 150 : 202, 20);
+        } else {
+            bar.setSegments(!bar.Segments());
+        }
+        const int paints = paintsUntilQuiet();
+        if (pick <= 7) { // a resize or a new look always repaints
+            EXPECT_EQ(paints > 0, drawn(bar.Value()) != before)
+                << "step " << step << ", value " << bar.Value();
+        }
+        if (paints > 0) {
+            EXPECT_EQ(counter.lastPaintedValue, bar.Value()) << "step " << step;
+        }
     }
 }
 
