@@ -358,6 +358,14 @@ void frmMain::RefreshMainList() {
     File1.setPattern(m_settings ? m_settings->txtDefPathFilter->text() : storedRomFilter(store));
     const QString search = txtSearch->text().trimmed();
 
+    // The first load's listing is already under way on another core, so its caption is
+    // painted while that listing finishes rather than after it.
+    if (m_bInitialLoad) {
+        fraSearch->setTitle(QStringLiteral("Loading ROM's List..."));
+        show();
+        QCoreApplication::processEvents();
+    }
+
     // Counting pass. Each enabled folder is listed once; the scanning pass below reuses
     // the listing, so both passes see the same files.
     const QStringList folderPaths = enabledRomFolders();
@@ -374,13 +382,10 @@ void frmMain::RefreshMainList() {
     for (const RomFolderListing& listing : listings)
         total += static_cast<double>(listing.names.size());
 
-    if (m_bInitialLoad) {
-        fraSearch->setTitle(QStringLiteral("Loading ROM's List..."));
-        show();
-    } else {
+    if (!m_bInitialLoad) {
         fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
+        QCoreApplication::processEvents();
     }
-    QCoreApplication::processEvents();
 
     txtSearch->hide();
     vbalProgressBar1->setMin(0);
@@ -394,6 +399,8 @@ void frmMain::RefreshMainList() {
     // Scanning pass: the rows are gathered first and handed to the list in one batch.
     QStringList folders;
     std::vector<RomListModel::Row> rows;
+    if (search.isEmpty())
+        rows.reserve(static_cast<size_t>(total));
     int done = 0;
     long long shownPercent = -1;
     const auto advance = [&](int value) {

@@ -2,6 +2,19 @@
 
 #include <QDir>
 
+QModelIndex RomListModel::index(int row, int column, const QModelIndex& parent) const {
+    if (parent.isValid() || row < 0 || column < 0 || static_cast<size_t>(row) >= m_rows.size() ||
+        static_cast<size_t>(column) >= m_columns.size())
+        return QModelIndex();
+    return createIndex(row, column);
+}
+
+Qt::ItemFlags RomListModel::flags(const QModelIndex& index) const {
+    if (!index.isValid())
+        return Qt::NoItemFlags;
+    return Qt::ItemIsSelectable | Qt::ItemIsEnabled | Qt::ItemNeverHasChildren;
+}
+
 int RomListModel::rowCount(const QModelIndex& parent) const {
     return parent.isValid() ? 0 : static_cast<int>(m_rows.size());
 }

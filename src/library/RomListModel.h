@@ -23,6 +23,11 @@ public:
 
     using QAbstractTableModel::QAbstractTableModel;
 
+    // index() and flags() answer without the base class's range checks through virtual
+    // calls: the view asks for every row when it lays out 100,000 of them.
+    QModelIndex index(int row, int column,
+                      const QModelIndex& parent = QModelIndex()) const override;
+    Qt::ItemFlags flags(const QModelIndex& index) const override;
     int rowCount(const QModelIndex& parent = QModelIndex()) const override;
     int columnCount(const QModelIndex& parent = QModelIndex()) const override;
     QVariant data(const QModelIndex& index, int role) const override;
