@@ -40,16 +40,39 @@ extern char** environ;
 
 namespace {
 
+using Clock = std::chrono::steady_clock;
+
+// With LUM_BENCH_PHASES set, a child prints how long each step of its start took.
+class Phases {
+public:
+    void operator()(const char* what) const {
+        if (m_on)
+            std::fprintf(stderr, "%-8s %7.1f ms\n", what,
+                         std::chrono::duration<double, std::milli>(Clock::now() - m_start).count());
+    }
+
+private:
+    Clock::time_point m_start = Clock::now();
+    bool m_on = std::getenv("LUM_BENCH_PHASES") != nullptr;
+};
+
 // Ends the process at the first paint of the watched window.
 class FirstPaint : public QObject {
 public:
+    explicit FirstPaint(const Phases* phases = nullptr) : m_phases(phases) {}
     bool eventFilter(QObject*, QEvent* event) override {
         if (event->type() == QEvent::Paint) {
+            if (m_phases)
+                (*m_phases)("paint");
             std::fflush(stdout);
+            std::fflush(stderr);
             _exit(0);
         }
         return false;
     }
+
+private:
+    const Phases* m_phases;
 };
 
 // withText: a line of text in the window, so that the font system starts as it must for
@@ -67,15 +90,7 @@ int runMinimal(int argc, char** argv, bool withText) {
 }
 
 int runLum(int argc, char** argv, const char* configFile) {
-    const auto t0 = std::chrono::steady_clock::now();
-    const bool phases = std::getenv("LUM_BENCH_PHASES") != nullptr;
-    auto phase = [&](const char* what) {
-        if (phases)
-            std::fprintf(
-                stderr, "%-12s %7.1f ms\n", what,
-                std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - t0)
-                    .count());
-    };
+    const Phases phase;
     QApplication app(argc, argv);
     phase("app");
     IniSettingsStore store(QString::fromLocal8Bit(configFile));
@@ -86,7 +101,7 @@ int runLum(int argc, char** argv, const char* configFile) {
     Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network, registry};
     frmMain window(platform);
     phase("windows");
-    FirstPaint watcher;
+    FirstPaint watcher(&phase);
     // The load handler shows the window and lets one paint through before it fills the
     // list; the paint that counts is the first one after the fill.
     window.Form_Load();
@@ -128,16 +143,27 @@ Run spawnChild(const char* self, const std::vector<const char*>& args) {
     for (const char* a : args)
         argv.push_back(const_cast<char*>(a));
     argv.push_back(nullptr);
+    // Qt's warnings about the offscreen platform would bury the report.
+    posix_spawn_file_actions_t quiet;
+    posix_spawn_file_actions_init(&quiet);
+    posix_spawn_file_actions_addopen(&quiet, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
     const auto start = std::chrono::steady_clock::now();
     pid_t pid = 0;
-    if (posix_spawn(&pid, self, nullptr, nullptr, argv.data(), environ) != 0) {
-        std::perror("posix_spawn");
+    const int spawned = posix_spawn(&pid, self, &quiet, nullptr, argv.data(), environ);
+    posix_spawn_file_actions_destroy(&quiet);
+    if (spawned != 0) {
+        std::fprintf(stderr, "could not start %s: %s\n", self, std::strerror(spawned));
         std::exit(1);
     }
     int status = 0;
     rusage usage{};
     wait4(pid, &status, 0, &usage);
     const auto end = std::chrono::steady_clock::now();
+    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
+        std::fprintf(stderr, "%s %s did not start cleanly (status %d); run it by hand to see why\n",
+                     self, args.empty() ? "" : args[0], status);
+        std::exit(1);
+    }
     return {std::chrono::duration<double, std::milli>(end - start).count(), usage.ru_maxrss};
 }
 
