@@ -398,9 +398,8 @@ void frmMain::RefreshMainList() {
 
     // Scanning pass: the rows are gathered first and handed to the list in one batch.
     QStringList folders;
-    std::vector<RomListModel::Row> rows;
-    if (search.isEmpty())
-        rows.reserve(static_cast<size_t>(total));
+    NameList names;
+    std::vector<int> rowFolders;
     int done = 0;
     long long shownPercent = -1;
     const auto advance = [&](int value) {
@@ -418,14 +417,21 @@ void frmMain::RefreshMainList() {
         const int count = static_cast<int>(listing.names.size());
         for (int i = 0; i < count; ++i) {
             advance(i + done);
-            QString& name = listing.names[i];
-            if (search.isEmpty() || MatchesSearch(search, name))
-                rows.push_back({std::move(name), folderIndex});
+            const QStringView name = listing.names.at(i);
+            if (!search.isEmpty() && MatchesSearch(search, name)) {
+                names.append(name);
+                rowFolders.push_back(folderIndex);
+            }
         }
         advance(count + done);
         done += count;
+        // Without a search every name is a row, so the folder's names are taken whole.
+        if (search.isEmpty()) {
+            rowFolders.insert(rowFolders.end(), static_cast<size_t>(count), folderIndex);
+            names.append(std::move(listing.names));
+        }
     }
-    m_listModel->setRows(std::move(folders), std::move(rows));
+    m_listModel->setRows(std::move(folders), std::move(names), std::move(rowFolders));
 
     const int k = m_listModel->rowCount();
     QString mark = k == 1 ? QString() : QStringLiteral("'s");

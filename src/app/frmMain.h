@@ -131,7 +131,7 @@ private:
 
     struct RomFolderListing {
         QString folder;
-        QStringList names;
+        NameList names;
     };
     // The enabled ROM folders, in their stored order.
     QStringList enabledRomFolders() const;

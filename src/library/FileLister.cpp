@@ -116,17 +116,19 @@ QString decodeName(std::string_view name) {
 }
 
 struct SortEntry {
+    static constexpr std::uint32_t kAscii = ~std::uint32_t{0};
+
     std::uint64_t prefix0, prefix1; // the key's first sixteen bytes
     const char* key;
     const char* name;
     std::uint32_t keySize, nameSize;
-    std::uint32_t index; // of the name's QString
+    std::uint32_t decoded; // the name's QString, or kAscii when its bytes are its text
     std::string_view keyView() const { return {key, keySize}; }
     std::string_view nameView() const { return {name, nameSize}; }
 };
 
-// The matching names of every batch: their sort keys (case-folded UTF-8, which for plain
-// ASCII names is just their lower-case bytes) and their QStrings, made once each.
+// The matching names of every batch and their sort keys: case-folded UTF-8, which for plain
+// ASCII names is just their lower-case bytes. Only names that are not ASCII are decoded here.
 class MatchedNames {
 public:
     explicit MatchedNames(const FilePattern& pattern) : m_pattern(pattern) {}
@@ -144,7 +146,7 @@ public:
             const std::string_view name(raw.data() + at);
             at += name.size() + 1;
             const size_t keyStart = keys.size();
-            QString decoded;
+            std::uint32_t decoded = SortEntry::kAscii;
             if (m_pattern.asciiOnly() && isAscii(name)) {
                 keys.resize(keyStart + name.size());
                 std::transform(
@@ -154,18 +156,21 @@ public:
                     keys.resize(keyStart);
                     continue;
                 }
-                decoded = QString::fromLatin1(name.data(), static_cast<qsizetype>(name.size()));
+                m_charCount += static_cast<qsizetype>(name.size());
             } else {
-                decoded = decodeName(name);
-                if (!m_pattern.matches(decoded))
+                QString text = decodeName(name);
+                if (!m_pattern.matches(text))
                     continue;
-                keys += foldCase(decoded).toStdString();
+                keys += foldCase(text).toStdString();
+                m_charCount += text.size();
+                if (!isAscii(name)) {
+                    decoded = static_cast<std::uint32_t>(m_decoded.size());
+                    m_decoded.push_back(std::move(text));
+                }
             }
             keySpans.emplace_back(keyStart, keys.size() - keyStart);
-            m_entries.push_back({0, 0, nullptr, name.data(), 0,
-                                 static_cast<std::uint32_t>(name.size()),
-                                 static_cast<std::uint32_t>(m_names.size())});
-            m_names.push_back(std::move(decoded));
+            m_entries.push_back(
+                {0, 0, nullptr, name.data(), 0, static_cast<std::uint32_t>(name.size()), decoded});
         }
         for (size_t i = 0; i < keySpans.size(); ++i) {
             SortEntry& e = m_entries[first + i];
@@ -186,13 +191,17 @@ public:
     }
 
     // Sorted by the folded name; equal keys keep a stable, case-sensitive order.
-    QStringList takeSorted() {
+    NameList takeSorted() {
         while (m_runStarts.size() >= 2)
             mergeTopRuns();
-        QStringList sorted;
-        sorted.reserve(static_cast<qsizetype>(m_entries.size()));
-        for (const SortEntry& e : m_entries)
-            sorted.push_back(std::move(m_names[e.index]));
+        NameList sorted;
+        sorted.reserve(static_cast<qsizetype>(m_entries.size()), m_charCount);
+        for (const SortEntry& e : m_entries) {
+            if (e.decoded == SortEntry::kAscii)
+                sorted.appendLatin1(e.name, e.nameSize);
+            else
+                sorted.append(m_decoded[e.decoded]);
+        }
         return sorted;
     }
 
@@ -228,7 +237,8 @@ private:
     std::deque<std::string> m_keyStore;
     std::vector<SortEntry> m_entries;
     std::vector<size_t> m_runStarts; // the sorted runs still to merge, in order
-    std::vector<QString> m_names;
+    std::vector<QString> m_decoded;
+    qsizetype m_charCount = 0;
 };
 
 } // namespace
@@ -285,7 +295,7 @@ bool FilePattern::matchesFoldedAscii(std::string_view foldedName) const {
         });
 }
 
-QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
+NameList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
     if (folder.isEmpty())
         return {};
     const QByteArray native = QFile::encodeName(folder);
@@ -356,9 +366,9 @@ void FileLister::setPath(const QString& folder) {
 QString FileLister::List(int index) const {
     if (index < 0 || index >= m_names.size())
         return QString();
-    return m_names[index];
+    return m_names.at(index).toString();
 }
 
-QStringList FileLister::takeNames() {
-    return std::exchange(m_names, QStringList());
+NameList FileLister::takeNames() {
+    return std::exchange(m_names, NameList());
 }

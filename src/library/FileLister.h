@@ -1,5 +1,7 @@
 #pragma once
 
+#include "library/NameList.h"
+
 #include <QString>
 #include <QStringList>
 
@@ -46,15 +48,15 @@ public:
     int ListCount() const { return static_cast<int>(m_names.size()); }
     // The i-th name, or the empty text past the end.
     QString List(int index) const;
-    const QStringList& names() const { return m_names; }
+    const NameList& names() const { return m_names; }
     // Hands the current listing over, leaving the lister empty.
-    QStringList takeNames();
+    NameList takeNames();
 
 private:
     FilePattern m_pattern;
     QString m_path;
-    QStringList m_names;
+    NameList m_names;
 };
 
 // Lists `folder` with `pattern` (the lister's work, without a lister).
-QStringList listMatchingFiles(const QString& folder, const FilePattern& pattern);
+NameList listMatchingFiles(const QString& folder, const FilePattern& pattern);

@@ -3,7 +3,7 @@
 #include <QDir>
 
 QModelIndex RomListModel::index(int row, int column, const QModelIndex& parent) const {
-    if (parent.isValid() || row < 0 || column < 0 || static_cast<size_t>(row) >= m_rows.size() ||
+    if (parent.isValid() || row < 0 || column < 0 || row >= m_names.size() ||
         static_cast<size_t>(column) >= m_columns.size())
         return QModelIndex();
     return createIndex(row, column);
@@ -16,7 +16,7 @@ Qt::ItemFlags RomListModel::flags(const QModelIndex& index) const {
 }
 
 int RomListModel::rowCount(const QModelIndex& parent) const {
-    return parent.isValid() ? 0 : static_cast<int>(m_rows.size());
+    return parent.isValid() ? 0 : static_cast<int>(m_names.size());
 }
 
 int RomListModel::columnCount(const QModelIndex& parent) const {
@@ -26,11 +26,10 @@ int RomListModel::columnCount(const QModelIndex& parent) const {
 QVariant RomListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || index.row() >= rowCount() || role != Qt::DisplayRole)
         return QVariant();
-    const Row& r = m_rows[static_cast<size_t>(index.row())];
     if (index.column() == 0)
-        return r.name;
+        return m_names.at(index.row()).toString();
     if (index.column() == 1)
-        return QDir::toNativeSeparators(m_folders[r.folder]);
+        return QDir::toNativeSeparators(m_folders[m_rowFolders[static_cast<size_t>(index.row())]]);
     return QVariant();
 }
 
@@ -53,25 +52,35 @@ void RomListModel::addColumn(const Column& column) {
 }
 
 void RomListModel::clear() {
-    if (m_rows.empty() && m_folders.isEmpty())
+    if (m_names.isEmpty() && m_folders.isEmpty())
         return;
     beginResetModel();
-    m_rows.clear();
-    m_rows.shrink_to_fit();
+    m_names = NameList();
+    m_rowFolders = std::vector<int>();
     m_folders.clear();
     endResetModel();
 }
 
-void RomListModel::setRows(QStringList folders, std::vector<Row> rows) {
+void RomListModel::setRows(QStringList folders, NameList names, std::vector<int> rowFolders) {
     beginResetModel();
     m_folders = std::move(folders);
-    m_rows = std::move(rows);
+    m_names = std::move(names);
+    m_rowFolders = std::move(rowFolders);
     endResetModel();
 }
 
-QString RomListModel::rowPath(int index) const {
-    if (index < 0 || index >= rowCount())
+QString RomListModel::name(int row) const {
+    if (row < 0 || row >= rowCount())
         return QString();
-    const Row& r = m_rows[static_cast<size_t>(index)];
-    return m_folders[r.folder] + u'/' + r.name;
+    return m_names.at(row).toString();
+}
+
+QString RomListModel::rowPath(int row) const {
+    if (row < 0 || row >= rowCount())
+        return QString();
+    const QString& folder = m_folders[m_rowFolders[static_cast<size_t>(row)]];
+    const QStringView name = m_names.at(row);
+    QString path;
+    path.reserve(folder.size() + 1 + name.size());
+    return path.append(folder).append(u'/').append(name);
 }

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "library/NameList.h"
+
 #include <QAbstractTableModel>
 #include <QStringList>
 
@@ -7,14 +9,11 @@
 
 // The rows of the ROM list: each row is a file name and the folder it was found in.
 // Columns are added by the window (none at first); the first shows the name, the second
-// the folder. Rows are replaced in one batch so a refresh costs one model reset.
+// the folder. Rows are replaced in one batch so a refresh costs one model reset, and their
+// names are held in one buffer.
 class RomListModel final : public QAbstractTableModel {
     Q_OBJECT
 public:
-    struct Row {
-        QString name;
-        int folder = 0; // index into folders()
-    };
     struct Column {
         QString key;
         QString header;
@@ -37,15 +36,17 @@ public:
     const std::vector<Column>& columns() const { return m_columns; }
 
     void clear();
-    void setRows(QStringList folders, std::vector<Row> rows);
+    // Row i is names[i], found in folders[rowFolders[i]].
+    void setRows(QStringList folders, NameList names, std::vector<int> rowFolders);
 
-    const Row& row(int index) const { return m_rows[static_cast<size_t>(index)]; }
-    const QString& folder(int index) const { return m_folders[index]; }
+    // A row's file name, or the empty text for a row that does not exist.
+    QString name(int row) const;
     // The full path of a row's file: its own folder, '/', its name.
-    QString rowPath(int index) const;
+    QString rowPath(int row) const;
 
 private:
     QStringList m_folders;
-    std::vector<Row> m_rows;
+    NameList m_names;
+    std::vector<int> m_rowFolders;
     std::vector<Column> m_columns;
 };

@@ -13,7 +13,7 @@ QString mid(const QString& s, qsizetype start, qsizetype count) {
     return s.mid(start, count);
 }
 
-bool contains(const QString& haystack, const QString& term) {
+bool contains(QStringView haystack, const QString& term) {
     if (term.isEmpty())
         return !haystack.isEmpty();
     return haystack.contains(term, Qt::CaseInsensitive);
@@ -36,7 +36,7 @@ Term readTerm(QString t) {
 
 } // namespace
 
-bool MatchesSearch(const QString& searchText, const QString& fileName) {
+bool MatchesSearch(const QString& searchText, QStringView fileName) {
     const QString& s = searchText;
     const qsizetype length = s.size();
     enum class Op { And, Xor, Or } op;

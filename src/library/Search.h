@@ -1,8 +1,9 @@
 #pragma once
 
 #include <QString>
+#include <QStringView>
 
 // Whether a file name matches a search expression: one or two terms joined by AND, XOR
 // or OR (capitals only, the first of them found in that order decides), each term
 // optionally preceded by NOT. Terms are substrings matched without regard to case.
-bool MatchesSearch(const QString& searchText, const QString& fileName);
+bool MatchesSearch(const QString& searchText, QStringView fileName);

@@ -29,7 +29,7 @@ protected:
     QStringList names() {
         QStringList out;
         for (int i = 0; i < app.window->listModel().rowCount(); ++i)
-            out << app.window->listModel().row(i).name;
+            out << app.window->listModel().name(i);
         return out;
     }
     void search(const QString& text) {

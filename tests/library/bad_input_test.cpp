@@ -113,7 +113,7 @@ TEST(BadInputRomFolders, OnlyReadableRegularFilesAreListed) {
     FileLister lister;
     lister.setPattern("*.bin");
     lister.setPath(folder);
-    EXPECT_EQ(lister.names(), QStringList({"good.bin", "link.bin"}));
+    EXPECT_EQ(lister.names().toStringList(), QStringList({"good.bin", "link.bin"}));
 
     // A file, an empty folder, a missing one, no path at all.
     for (const QString& path : {fake.writeFile("file.bin", "x"), fake.makeFolder("empty"),
@@ -172,13 +172,14 @@ TEST(BadInputRomFolders, NamesWithWildcardCharactersAreListed) {
     FileLister lister;
     lister.setPattern("*.bin");
     lister.setPath(folder);
-    EXPECT_EQ(lister.names(), QStringList({"*game.bin", "?.bin", "a.bin", "x*.bin"}));
+    EXPECT_EQ(lister.names().toStringList(),
+              QStringList({"*game.bin", "?.bin", "a.bin", "x*.bin"}));
     lister.setPattern("*");
     lister.setPath(folder);
     EXPECT_EQ(lister.ListCount(), 5);
     lister.setPattern("*g*");
     lister.setPath(folder);
-    EXPECT_EQ(lister.names(), QStringList{"*game.bin"});
+    EXPECT_EQ(lister.names().toStringList(), QStringList{"*game.bin"});
 }
 
 // A name that is not valid UTF-8 (a file copied from an old Latin-1 disk) is still listed;

@@ -32,7 +32,7 @@ TEST(FileLister, ListsMatchingRegularVisibleFilesSortedWithoutCase) {
     FileLister lister;
     lister.setPattern("*.bin");
     lister.setPath(folder);
-    EXPECT_EQ(lister.names(), (QStringList{"A.bin", "a.bin", "b.bin", "c.BIN"}));
+    EXPECT_EQ(lister.names().toStringList(), (QStringList{"A.bin", "a.bin", "b.bin", "c.BIN"}));
     EXPECT_EQ(lister.ListCount(), 4);
     EXPECT_EQ(lister.List(3), "c.BIN");
     EXPECT_EQ(lister.List(4), QString());
@@ -82,5 +82,5 @@ TEST(FileLister, ALargeFolderIsSortedAsOneList) {
     FileLister lister;
     lister.setPattern("*.bin");
     lister.setPath(folder);
-    EXPECT_EQ(lister.names(), expected);
+    EXPECT_EQ(lister.names().toStringList(), expected);
 }
