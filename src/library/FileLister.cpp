@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <condition_variable>
 #include <cstdint>
+#include <cstring>
 #include <deque>
 #include <future>
 #include <memory>
@@ -62,9 +63,12 @@ QString foldCase(QStringView s) {
 // The first eight bytes of a key from `from` on, big-endian, zero-padded: comparing two of
 // these compares those bytes as memcmp would, and most comparisons end there.
 std::uint64_t bigEndianPrefix(std::string_view key, size_t from) {
+    unsigned char bytes[8] = {};
+    if (from < key.size())
+        std::memcpy(bytes, key.data() + from, std::min<size_t>(8, key.size() - from));
     std::uint64_t prefix = 0;
-    for (size_t i = from; i < from + 8; ++i)
-        prefix = (prefix << 8) | (i < key.size() ? static_cast<unsigned char>(key[i]) : 0u);
+    for (const unsigned char b : bytes)
+        prefix = (prefix << 8) | b;
     return prefix;
 }
 
