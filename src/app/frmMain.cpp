@@ -400,6 +400,7 @@ void frmMain::RefreshMainList() {
     QStringList folders;
     NameList names;
     std::vector<int> rowFolders;
+    const SearchExpression expression(search);
     int done = 0;
     long long shownPercent = -1;
     const auto advance = [&](int value) {
@@ -418,7 +419,7 @@ void frmMain::RefreshMainList() {
         for (int i = 0; i < count; ++i) {
             advance(i + done);
             const QStringView name = listing.names.at(i);
-            if (!search.isEmpty() && MatchesSearch(search, name)) {
+            if (!search.isEmpty() && expression.matches(name)) {
                 names.append(name);
                 rowFolders.push_back(folderIndex);
             }

@@ -19,10 +19,7 @@ bool contains(QStringView haystack, const QString& term) {
     return haystack.contains(term, Qt::CaseInsensitive);
 }
 
-struct Term {
-    QString text;
-    bool negated = false;
-};
+using Term = SearchExpression::Term;
 
 Term readTerm(QString t) {
     t = t.trimmed();
@@ -36,43 +33,52 @@ Term readTerm(QString t) {
 
 } // namespace
 
-bool MatchesSearch(const QString& searchText, QStringView fileName) {
+SearchExpression::SearchExpression(const QString& searchText) {
     const QString& s = searchText;
     const qsizetype length = s.size();
-    enum class Op { And, Xor, Or } op;
     QString left, right;
 
     // Positions below are 1-based, as the expression's rules state them.
     if (const qsizetype i = s.indexOf(QLatin1String("AND")); i >= 0) {
         const qsizetype p = i + 1;
-        op = Op::And;
+        m_op = Op::And;
         left = mid(s, 0, p - 2);
         right = mid(s, p + 2, length - p - 2);
     } else if (const qsizetype j = s.indexOf(QLatin1String("XOR")); j >= 0) {
         const qsizetype p = j + 1;
-        op = Op::Xor;
+        m_op = Op::Xor;
         left = mid(s, 0, p - 2);
         right = mid(s, p + 2, length - p - 2);
     } else if (const qsizetype k = s.indexOf(QLatin1String("OR")); k >= 0) {
         const qsizetype p = k + 1;
-        op = Op::Or;
+        m_op = Op::Or;
         left = mid(s, 0, p - 1);
         right = mid(s, p + 1, length - p - 1);
     } else {
-        return contains(fileName, s);
+        m_op = Op::Single;
+        m_a = {s, false};
+        return;
     }
+    m_a = readTerm(left);
+    m_b = readTerm(right);
+}
 
-    const Term a = readTerm(left);
-    const Term b = readTerm(right);
-    const bool inA = contains(fileName, a.text) != a.negated;
-    const bool inB = contains(fileName, b.text) != b.negated;
-    switch (op) {
+bool SearchExpression::matches(QStringView fileName) const {
+    const bool inA = contains(fileName, m_a.text) != m_a.negated;
+    const auto inB = [&] { return contains(fileName, m_b.text) != m_b.negated; };
+    switch (m_op) {
+    case Op::Single:
+        return inA;
     case Op::And:
-        return inA && inB;
+        return inA && inB();
     case Op::Xor:
-        return inA != inB;
+        return inA != inB();
     case Op::Or:
-        return inA || inB;
+        return inA || inB();
     }
     return false;
+}
+
+bool MatchesSearch(const QString& searchText, QStringView fileName) {
+    return SearchExpression(searchText).matches(fileName);
 }

@@ -7,3 +7,19 @@
 // or OR (capitals only, the first of them found in that order decides), each term
 // optionally preceded by NOT. Terms are substrings matched without regard to case.
 bool MatchesSearch(const QString& searchText, QStringView fileName);
+
+// The same expression read once, for matching many names.
+class SearchExpression {
+public:
+    explicit SearchExpression(const QString& searchText);
+    bool matches(QStringView fileName) const;
+
+    struct Term {
+        QString text;
+        bool negated = false;
+    };
+
+private:
+    enum class Op { Single, And, Xor, Or } m_op = Op::Single;
+    Term m_a, m_b;
+};
