@@ -198,14 +198,25 @@ public:
     NameList takeSorted() {
         while (m_runStarts.size() >= 2)
             mergeTopRuns();
-        NameList sorted;
-        sorted.reserve(static_cast<qsizetype>(m_entries.size()), m_charCount);
-        for (const SortEntry& e : m_entries) {
-            if (e.decoded == SortEntry::kAscii)
-                sorted.appendLatin1(e.name, e.nameSize);
-            else
-                sorted.append(m_decoded[e.decoded]);
-        }
+        const auto names = [this](size_t from, size_t to) {
+            NameList part;
+            part.reserve(static_cast<qsizetype>(to - from), m_charCount);
+            for (size_t i = from; i < to; ++i) {
+                const SortEntry& e = m_entries[i];
+                if (e.decoded == SortEntry::kAscii)
+                    part.appendLatin1(e.name, e.nameSize);
+                else
+                    part.append(m_decoded[e.decoded]);
+            }
+            return part;
+        };
+        // A long list is written out in two halves at once.
+        const size_t count = m_entries.size();
+        if (count < kTwoHalvesFrom)
+            return names(0, count);
+        auto second = std::async(std::launch::async, names, count / 2, count);
+        NameList sorted = names(0, count / 2);
+        sorted.append(second.get());
         return sorted;
     }
 
@@ -235,6 +246,8 @@ private:
         m_runStarts.pop_back();
         std::inplace_merge(at(m_runStarts.back()), at(top), m_entries.end(), less);
     }
+
+    static constexpr size_t kTwoHalvesFrom = 8192;
 
     const FilePattern& m_pattern;
     std::deque<std::string> m_batchStore; // the entries point into these two

@@ -65,19 +65,19 @@ TEST(FileLister, ALargeFolderIsSortedAsOneList) {
     // ASCII, in an order the folder does not keep.
     for (int i = 0; i < 9000; ++i) {
         const int n = (i * 7919) % 9000;
-        QString name = n % 3 == 0   ? QStringLiteral("Activision Collection - %1.bin").arg(n)
-                       : n % 3 == 1 ? QStringLiteral("activision collection - %1.BIN").arg(n / 10)
-                                    : QStringLiteral("Émulé %1.bin").arg(n);
-        if (!QFile::exists(folder + u'/' + name)) {
-            fake.writeFile(QStringLiteral("roms/") + name);
-            expected.push_back(name);
-        }
+        const QString name = n % 3 == 0 ? QStringLiteral("Activision Collection - %1.bin").arg(n)
+                             : n % 3 == 1
+                                 ? QStringLiteral("activision collection - %1.BIN").arg(n - 1)
+                                 : QStringLiteral("Émulé %1.bin").arg(n);
+        QFile(folder + u'/' + name).open(QIODevice::WriteOnly);
+        expected.push_back(name);
     }
     fake.writeFile(QStringLiteral("roms/notes.txt"));
-    std::sort(expected.begin(), expected.end(), [](const QString& a, const QString& b) {
-        const QByteArray ka = a.toCaseFolded().toUtf8(), kb = b.toCaseFolded().toUtf8();
-        return ka != kb ? ka < kb : a.toUtf8() < b.toUtf8();
-    });
+    const auto key = [](const QString& name) {
+        return std::pair(name.toCaseFolded().toUtf8(), name.toUtf8());
+    };
+    std::sort(expected.begin(), expected.end(),
+              [&](const QString& a, const QString& b) { return key(a) < key(b); });
 
     FileLister lister;
     lister.setPattern("*.bin");
