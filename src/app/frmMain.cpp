@@ -403,14 +403,20 @@ void frmMain::RefreshMainList() {
     const SearchExpression expression(search);
     int done = 0;
     long long shownPercent = -1;
+    int shownUntil = -1; // the last value known to give the percent shown
     const auto advance = [&](int value) {
         vbalProgressBar1->setValue(value);
-        // The percent text only changes when its rounded value does.
-        const long long percent = std::llround(vbalProgressBar1->Percent());
+        // The percent text only changes when its rounded value does. Values only grow
+        // here, so where the next change comes is worked out once per percent.
+        if (value <= shownUntil)
+            return;
+        const auto percentAt = [&](int v) { return std::llround(vbalProgressBar1->PercentAt(v)); };
+        const long long percent = percentAt(value);
         if (percent != shownPercent) {
             shownPercent = percent;
             vbalProgressBar1->setText(QString::number(percent) + u'%');
         }
+        shownUntil = progressbar::runEnd(value, +1, [&](int v) { return percentAt(v) == percent; });
     };
     for (RomFolderListing& listing : listings) {
         const int folderIndex = static_cast<int>(folders.size());

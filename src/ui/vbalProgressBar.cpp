@@ -15,7 +15,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <limits>
 
 namespace progressbar {
 
@@ -247,32 +246,14 @@ void vbalProgressBar::rememberBar() {
     const QRect track = this->track();
     const bool across = horizontal();
     const int step = barStep();
-    const auto barAt = [&](long long value) {
-        return progressbar::barRect(
-            track, progressbar::fraction(static_cast<int>(value), m_min, m_max), across, step);
+    const auto barAt = [&](int value) {
+        return progressbar::barRect(track, progressbar::fraction(value, m_min, m_max), across,
+                                    step);
     };
     const QRect bar = barAt(m_value);
-    const auto drawsBar = [&](long long value) {
-        return value >= std::numeric_limits<int>::min() &&
-               value <= std::numeric_limits<int>::max() && barAt(value) == bar;
-    };
-    // The last Value in `direction` that still draws this bar: gallop, then halve.
-    const auto spanEnd = [&](int direction) {
-        long long good = m_value;
-        long long bad = good;
-        for (long long jump = 1;; jump *= 2) {
-            bad = good + direction * jump;
-            if (!drawsBar(bad))
-                break;
-            good = bad;
-        }
-        while (bad - good > 1 || good - bad > 1) {
-            const long long mid = good + (bad - good) / 2;
-            (drawsBar(mid) ? good : bad) = mid;
-        }
-        return static_cast<int>(good);
-    };
-    m_barMemo = {m_epoch, size(), spanEnd(-1), spanEnd(+1), bar};
+    const auto drawsBar = [&](int value) { return barAt(value) == bar; };
+    m_barMemo = {m_epoch, size(), progressbar::runEnd(m_value, -1, drawsBar),
+                 progressbar::runEnd(m_value, +1, drawsBar), bar};
 }
 
 void vbalProgressBar::redraw() {
@@ -378,7 +359,11 @@ void vbalProgressBar::ModifyPicture(double fLuminance, double fSaturation) {
 }
 
 double vbalProgressBar::Percent() const {
-    return fraction() * 100.0;
+    return PercentAt(m_value);
+}
+
+double vbalProgressBar::PercentAt(int value) const {
+    return progressbar::fraction(value, m_min, m_max) * 100.0;
 }
 
 void vbalProgressBar::initStyleOption(QStyleOptionProgressBar& option) const {

@@ -9,6 +9,7 @@
 #include <QWidget>
 
 #include <cstdint>
+#include <limits>
 
 class QPainter;
 class QStyleOptionProgressBar;
@@ -37,6 +38,29 @@ QList<QRect> gapStrips(const QRect& bar, const QRect& inner, bool horizontal, in
 // The value for a press at x across a bar that starts at left and is width pixels long:
 // the first pixel column is Min, the last Max; beyond either end it is held there.
 int valueAt(double x, int left, int width, int min, int max);
+
+// The last value from `from` on, stepping by `direction` (+1 or -1), for which same(value)
+// holds, when it holds for one unbroken run of values starting at `from`. It is found by
+// galloping and halving, so a run of a million values costs some forty calls.
+template <typename Same> int runEnd(int from, int direction, const Same& same) {
+    const auto holds = [&](long long value) {
+        return value >= std::numeric_limits<int>::min() &&
+               value <= std::numeric_limits<int>::max() && same(static_cast<int>(value));
+    };
+    long long good = from;
+    long long bad = good;
+    for (long long jump = 1;; jump *= 2) {
+        bad = good + direction * jump;
+        if (!holds(bad))
+            break;
+        good = bad;
+    }
+    while (bad - good > 1 || good - bad > 1) {
+        const long long mid = good + (bad - good) / 2;
+        (holds(mid) ? good : bad) = mid;
+    }
+    return static_cast<int>(good);
+}
 
 } // namespace progressbar
 
@@ -68,6 +92,8 @@ public:
     bool ShowText() const { return m_showText; }
     void setShowText(bool on);
     double Percent() const;
+    // What Percent would be with Value at `value`.
+    double PercentAt(int value) const;
     int Min() const { return m_min; }
     void setMin(int min);
     int Max() const { return m_max; }

@@ -8,6 +8,7 @@
 #include <gtest/gtest.h>
 
 #include <climits>
+#include <cmath>
 #include <random>
 
 namespace {
@@ -306,6 +307,32 @@ TEST(ProgressBar, RedrawsWheneverTheBarsEndMovesAndOnlyThen) {
         }
         if (paints > 0) {
             EXPECT_EQ(counter.lastPaintedValue, bar.Value()) << "step " << step;
+        }
+    }
+}
+
+// The bar's memo and the refresh's percent text both skip the values that change nothing:
+// the run of values with the same rounded percent must end exactly where a scan says.
+TEST(ProgressBar, RunEndFindsWhereTheRoundedPercentNextChanges) {
+    for (const int max : {1, 3, 7, 100, 101, 999, 65537}) {
+        const auto percent = [max](int v) {
+            return std::llround(progressbar::fraction(v, 0, max) * 100.0);
+        };
+        const int stride = max > 1000 ? 97 : 1;
+        for (int v = 0; v <= max; v += stride) {
+            int last = v;
+            while (last < max && percent(last + 1) == percent(v))
+                ++last;
+            if (last == max) // past Max the bar stays full
+                last = INT_MAX;
+            int first = v;
+            while (first > 0 && percent(first - 1) == percent(v))
+                --first;
+            if (first == 0) // below Min it stays empty
+                first = INT_MIN;
+            const auto same = [&](int u) { return percent(u) == percent(v); };
+            ASSERT_EQ(progressbar::runEnd(v, +1, same), last) << max << " " << v;
+            ASSERT_EQ(progressbar::runEnd(v, -1, same), first) << max << " " << v;
         }
     }
 }
