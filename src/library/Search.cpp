@@ -13,22 +13,25 @@ QString mid(const QString& s, qsizetype start, qsizetype count) {
     return s.mid(start, count);
 }
 
-bool contains(QStringView haystack, const QString& term) {
-    if (term.isEmpty())
-        return !haystack.isEmpty();
-    return haystack.contains(term, Qt::CaseInsensitive);
+bool isAscii(QStringView s) {
+    return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
 }
 
 using Term = SearchExpression::Term;
+
+Term makeTerm(QString text, bool negated) {
+    QString lower = isAscii(text) ? text.toLower() : QString();
+    return {std::move(text), negated, std::move(lower)};
+}
 
 Term readTerm(QString t) {
     t = t.trimmed();
     const qsizetype q = t.indexOf(QLatin1String("NOT")); // 0-based; 1-based is q + 1
     if (q < 0)
-        return {t, false};
+        return makeTerm(t, false);
     // length(T) - q1 - 2 characters from 1-based q1 + 3, i.e. everything after NOT.
     const qsizetype q1 = q + 1;
-    return {mid(t, q1 + 2, t.size() - q1 - 2).trimmed(), true};
+    return makeTerm(mid(t, q1 + 2, t.size() - q1 - 2).trimmed(), true);
 }
 
 } // namespace
@@ -56,7 +59,7 @@ SearchExpression::SearchExpression(const QString& searchText) {
         right = mid(s, p + 1, length - p - 1);
     } else {
         m_op = Op::Single;
-        m_a = {s, false};
+        m_a = makeTerm(s, false);
         return;
     }
     m_a = readTerm(left);
@@ -64,8 +67,8 @@ SearchExpression::SearchExpression(const QString& searchText) {
 }
 
 bool SearchExpression::matches(QStringView fileName) const {
-    const bool inA = contains(fileName, m_a.text) != m_a.negated;
-    const auto inB = [&] { return contains(fileName, m_b.text) != m_b.negated; };
+    const bool inA = m_a.contains(fileName) != m_a.negated;
+    const auto inB = [&] { return m_b.contains(fileName) != m_b.negated; };
     switch (m_op) {
     case Op::Single:
         return inA;
@@ -75,6 +78,32 @@ bool SearchExpression::matches(QStringView fileName) const {
         return inA != inB();
     case Op::Or:
         return inA || inB();
+    }
+    return false;
+}
+
+bool SearchExpression::Term::contains(QStringView fileName) const {
+    if (text.isEmpty())
+        return !fileName.isEmpty();
+    // Where both sides are plain ASCII, ignoring case is lower-casing the letters, which is
+    // all Qt's folding does there; anything else goes to Qt.
+    if (asciiLower.isEmpty() || !isAscii(fileName))
+        return fileName.contains(text, Qt::CaseInsensitive);
+    const char16_t* name = fileName.utf16();
+    const char16_t* term = QStringView(asciiLower).utf16();
+    const qsizetype m = asciiLower.size();
+    for (qsizetype at = 0; at + m <= fileName.size(); ++at) {
+        qsizetype k = 0;
+        while (k < m) {
+            char16_t c = name[at + k];
+            if (c >= u'A' && c <= u'Z')
+                c = static_cast<char16_t>(c + 32);
+            if (c != term[k])
+                break;
+            ++k;
+        }
+        if (k == m)
+            return true;
     }
     return false;
 }

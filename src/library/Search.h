@@ -17,6 +17,9 @@ public:
     struct Term {
         QString text;
         bool negated = false;
+        // The text in lower case when it is plain ASCII, for the quick comparison.
+        QString asciiLower;
+        bool contains(QStringView fileName) const;
     };
 
 private:

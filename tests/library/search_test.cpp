@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <random>
+
 namespace {
 
 struct Case {
@@ -65,4 +67,27 @@ TEST(MatchesSearch, ExpressionTable) {
     for (const Case& c : kCases)
         EXPECT_EQ(MatchesSearch(QString::fromUtf8(c.search), QString::fromUtf8(c.name)), c.matches)
             << '"' << c.search << "\" on \"" << c.name << '"';
+}
+
+// Plain ASCII terms and names are compared by a quicker path than Qt's; it must agree with
+// Qt's case-insensitive search, and names that are not ASCII (including letters that fold
+// to ASCII ones, such as the Kelvin sign) must still go by Qt's folding.
+TEST(MatchesSearch, TheAsciiPathAgreesWithQtsCaseFolding) {
+    const QString alphabet = QStringLiteral("aAbBcC1 .-_é\u212A");
+    std::mt19937 random(11);
+    const auto text = [&](int longest) {
+        QString s;
+        for (int n = static_cast<int>(random() % (longest + 1)); n > 0; --n)
+            s += alphabet[static_cast<qsizetype>(random() % alphabet.size())];
+        return s;
+    };
+    for (int i = 0; i < 5000; ++i) {
+        const QString term = text(3).trimmed(); // no capitals that spell an operator
+        const QString name = text(10);
+        const bool expected =
+            term.isEmpty() ? !name.isEmpty() : name.contains(term, Qt::CaseInsensitive);
+        ASSERT_EQ(MatchesSearch(term, name), expected)
+            << term.toStdString() << " in " << name.toStdString();
+    }
+    EXPECT_TRUE(MatchesSearch(QStringLiteral("k"), QStringLiteral("\u212A.bin")));
 }
