@@ -22,5 +22,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         FUZZ_CHECK(MatchesSearch(expression, name.toUpper()) == match);
         FUZZ_CHECK(MatchesSearch(expression, name.toLower()) == match);
     }
+    // Without an operator the expression is one term, found as Qt finds it ignoring case.
+    if (!expression.contains(QLatin1String("OR")) && !expression.contains(QLatin1String("AND")) &&
+        !expression.contains(QLatin1String("NOT")))
+        FUZZ_CHECK(match == (expression.isEmpty()
+                                 ? !name.isEmpty()
+                                 : name.contains(expression, Qt::CaseInsensitive)));
     return 0;
 }
