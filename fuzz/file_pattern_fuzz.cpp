@@ -2,9 +2,8 @@
 // the pattern, a NUL byte and the name.
 #include "FuzzSupport.h"
 
+#include "library/Ascii.h"
 #include "library/FileLister.h"
-
-#include <algorithm>
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const auto [pattern, name] = fuzz::twoTexts(data, size);
@@ -20,10 +19,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (match)
         FUZZ_CHECK(FilePattern(pattern + QStringLiteral(";x")).matches(name));
     // Folders match plain ASCII names through a quicker path, which must agree.
-    const auto ascii = [](const QString& s) {
-        return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
-    };
-    if (filter.asciiOnly() && ascii(name))
+    if (filter.asciiOnly() && isAscii(name))
         FUZZ_CHECK(filter.matchesFoldedAscii(name.toLower().toStdString()) == match);
     return 0;
 }

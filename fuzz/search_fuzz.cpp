@@ -2,17 +2,8 @@
 // byte and the name.
 #include "FuzzSupport.h"
 
+#include "library/Ascii.h"
 #include "library/Search.h"
-
-#include <algorithm>
-
-namespace {
-
-bool isAscii(const QString& s) {
-    return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
-}
-
-} // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const auto [expression, name] = fuzz::twoTexts(data, size);

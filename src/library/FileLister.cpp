@@ -1,5 +1,7 @@
 #include "library/FileLister.h"
 
+#include "library/Ascii.h"
+
 #include <QFile>
 
 #include <algorithm>
@@ -43,15 +45,6 @@ template <typename View> bool wildcardMatch(View pattern, View name) {
     while (p < pattern.size() && pattern[p] == '*')
         ++p;
     return p == pattern.size();
-}
-
-bool isAscii(QStringView s) {
-    return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
-}
-
-bool isAscii(std::string_view s) {
-    return std::all_of(s.begin(), s.end(),
-                       [](char c) { return static_cast<unsigned char>(c) < 0x80; });
 }
 
 QString foldCase(QStringView s) {

@@ -1,5 +1,7 @@
 #include "library/Search.h"
 
+#include "library/Ascii.h"
+
 #include <algorithm>
 
 namespace {
@@ -11,10 +13,6 @@ QString mid(const QString& s, qsizetype start, qsizetype count) {
         return QString();
     start = std::max<qsizetype>(start, 0);
     return s.mid(start, count);
-}
-
-bool isAscii(QStringView s) {
-    return std::all_of(s.begin(), s.end(), [](QChar c) { return c.unicode() < 0x80; });
 }
 
 using Term = SearchExpression::Term;
