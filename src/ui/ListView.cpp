@@ -1,5 +1,6 @@
 #include "ui/ListView.h"
 
+#include "ui/ListTextDelegate.h"
 #include "ui/OleColor.h"
 #include "ui/PictureFile.h"
 
@@ -15,6 +16,7 @@ ListView::ListView(QWidget* parent) : QTreeView(parent) {
     setSelectionMode(QAbstractItemView::SingleSelection);
     setEditTriggers(QAbstractItemView::NoEditTriggers);
     setAllColumnsShowFocus(true);
+    setItemDelegate(new ListTextDelegate(this));
     header()->setStretchLastSection(false);
     connect(this, &QAbstractItemView::doubleClicked, this,
             [this](const QModelIndex& index) { emit itemDoubleClicked(index.row()); });
