@@ -232,9 +232,12 @@ int main(int argc, char** argv) {
     }
 
     bench::report("start-up, 10000 ROMs", ours10k.time, "minimal Qt", floor.time, 1.5);
-    std::printf("   (for reference: a window with one line of text starts in %.1f ms; "
-                "ours is %.2f x that)\n",
-                textFloor.time.median(), ours10k.time.median() / textFloor.time.median());
+    // The minimal program draws no text, so it never starts the font system; a window with
+    // one line of text shows what that start alone costs against the same floor.
+    std::printf("   (for reference: a window with one line of text starts in %.1f ms, %.2f x the "
+                "minimal program; ours is %.2f x that)\n",
+                textFloor.time.median(), textFloor.time.median() / floor.time.median(),
+                ours10k.time.median() / textFloor.time.median());
 
     const bench::Samples readdir =
         bench::measure(kRuns, [&] { readdirBaseline(root + "/roms-100000"); });
