@@ -9,7 +9,7 @@ namespace {
 bool isPlainLine(const QStyleOptionViewItem& opt) {
     const QStyleOptionViewItem::ViewItemFeatures own =
         QStyleOptionViewItem::HasDisplay | QStyleOptionViewItem::Alternate;
-    if ((opt.features & ~own) ||
+    if ((opt.features & ~own) || (opt.state & QStyle::State_Editing) ||
         (opt.displayAlignment & Qt::AlignVertical_Mask) != Qt::AlignVCenter)
         return false;
     for (QChar c : opt.text) {

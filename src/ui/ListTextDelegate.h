@@ -9,7 +9,8 @@
 // Paints a one-line text cell as the style would, but lays its text out once: the style's
 // own item drawing shapes the text three to five times (size, elision, drawing), and a big
 // list repaints a screenful of cells on every scroll. Cells with an icon, a check box,
-// wrapping, a line break or a vertical alignment of their own are left to the style.
+// wrapping, a line break, an editor or a vertical alignment of their own are left to the
+// style.
 class ListTextDelegate : public QStyledItemDelegate {
     Q_OBJECT
 public:
