@@ -32,16 +32,18 @@ QTextLine layOut(QTextLayout& layout, int width) {
 
 ListTextDelegate::~ListTextDelegate() = default;
 
-const QTextLayout& ListTextDelegate::laidOut(int column, const QString& text,
-                                             const QStyleOptionViewItem& opt, int width) const {
+const ListTextDelegate::Line& ListTextDelegate::laidOut(int column, const QString& text,
+                                                        const QStyleOptionViewItem& opt,
+                                                        int width) const {
     if (column < 0)
         column = 0;
     if (static_cast<size_t>(column) >= m_lines.size())
         m_lines.resize(static_cast<size_t>(column) + 1);
     Line& last = m_lines[static_cast<size_t>(column)];
     if (last.layout && last.width == width && last.direction == opt.direction &&
-        last.alignment == opt.displayAlignment && last.text == text && last.font == opt.font)
-        return *last.layout;
+        last.alignment == opt.displayAlignment && last.elideMode == opt.textElideMode &&
+        last.text == text && last.font == opt.font)
+        return last;
 
     QTextOption textOption;
     textOption.setWrapMode(QTextOption::ManualWrap);
@@ -49,12 +51,22 @@ const QTextLayout& ListTextDelegate::laidOut(int column, const QString& text,
     textOption.setAlignment(QStyle::visualAlignment(opt.direction, opt.displayAlignment));
     auto layout = std::make_unique<QTextLayout>(text, opt.font);
     layout->setTextOption(textOption);
-    if (layOut(*layout, width).naturalTextWidth() > width) {
+    const QTextLine whole = layOut(*layout, width);
+    // The whole text's height places the line, even when what is left after the cut is
+    // shorter: the style does the same, and a name keeps its place as the column narrows.
+    last.height = static_cast<int>(whole.height());
+    if (whole.naturalTextWidth() > width) {
         layout->setText(QFontMetrics(opt.font).elidedText(text, opt.textElideMode, width));
         layOut(*layout, width);
     }
-    last = Line{text, opt.font, width, opt.direction, opt.displayAlignment, std::move(layout)};
-    return *last.layout;
+    last.text = text;
+    last.font = opt.font;
+    last.width = width;
+    last.direction = opt.direction;
+    last.alignment = opt.displayAlignment;
+    last.elideMode = opt.textElideMode;
+    last.layout = std::move(layout);
+    return last;
 }
 
 void ListTextDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option,
@@ -85,13 +97,12 @@ void ListTextDelegate::paint(QPainter* painter, const QStyleOptionViewItem& opti
     const int margin = style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, widget) + 1;
     const QRect textRect = opt.rect.adjusted(margin, 0, -margin, 0);
 
-    const QTextLayout& layout = laidOut(index.column(), text, opt, textRect.width());
-    const int height = static_cast<int>(layout.lineAt(0).height());
-    const int top = textRect.top() + (textRect.height() - height) / 2;
+    const Line& line = laidOut(index.column(), text, opt, textRect.width());
+    const int top = textRect.top() + (textRect.height() - line.height) / 2;
 
     painter->save();
     painter->setClipRect(opt.rect); // as the style does: a tall glyph stays in its cell
     painter->setPen(opt.palette.color(group, role));
-    layout.draw(painter, QPointF(textRect.left(), top));
+    line.layout->draw(painter, QPointF(textRect.left(), top));
     painter->restore();
 }

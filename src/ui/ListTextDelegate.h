@@ -29,10 +29,12 @@ private:
         int width = -1;
         Qt::LayoutDirection direction = Qt::LeftToRight;
         Qt::Alignment alignment;
-        std::unique_ptr<QTextLayout> layout;
+        Qt::TextElideMode elideMode = Qt::ElideRight;
+        std::unique_ptr<QTextLayout> layout; // the text as shown, cut to width
+        int height = 0;                      // of the whole text's line
     };
-    const QTextLayout& laidOut(int column, const QString& text, const QStyleOptionViewItem& opt,
-                               int width) const;
+    const Line& laidOut(int column, const QString& text, const QStyleOptionViewItem& opt,
+                        int width) const;
 
     mutable std::vector<Line> m_lines;
 };

@@ -33,7 +33,7 @@ QString firstDifference(const QImage& a, const QImage& b) {
 
 // The list's own text drawing must be indistinguishable from the style's, whatever the
 // name: short, cut off with an ellipsis, not Latin, right to left, empty, selected; and it
-// must follow the column's width and the list's font when they change.
+// must follow the column's width, the elision and the list's font when they change.
 TEST(ListText, PaintsTheSamePixelsAsTheStyle) {
     const QStringList names = {
         QStringLiteral("Adventure.bin"),
@@ -74,6 +74,12 @@ TEST(ListText, PaintsTheSamePixelsAsTheStyle) {
             [] {},
             [&] { view.header()->resizeSection(1, 250); },
             [&] { view.header()->resizeSection(1, 90); },
+            [&] { view.setTextElideMode(Qt::ElideMiddle); },
+            [&] { view.header()->resizeSection(0, 30); }, // little more than the ellipsis
+            [&] {                                         // narrower than the text's margins
+                view.header()->setMinimumSectionSize(1);
+                view.header()->resizeSection(0, 3);
+            },
             [&] {
                 QFont bigger = view.font();
                 bigger.setPointSize(bigger.pointSize() + 5);
