@@ -1,0 +1,162 @@
+#include "support/WidgetDump.h"
+
+#include <QAbstractButton>
+#include <QAction>
+#include <QComboBox>
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QGroupBox>
+#include <QHeaderView>
+#include <QKeySequence>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMenu>
+#include <QTabWidget>
+#include <QTreeWidget>
+#include <QWidget>
+
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <cstdlib>
+
+namespace {
+
+QString quoted(const QString& text) {
+    QString escaped = text;
+    escaped.replace(u'\\', QStringLiteral("\\\\"))
+        .replace(u'\r', QStringLiteral("\\r"))
+        .replace(u'\n', QStringLiteral("\\n"));
+    return u'"' + escaped + u'"';
+}
+
+void dumpAction(const QAction& action, int depth, QStringList& lines) {
+    if (action.objectName().isEmpty())
+        return;
+    QString line = QString(depth * 2, u' ') + QStringLiteral("QAction ") + action.objectName();
+    if (action.isSeparator())
+        line += QStringLiteral(" separator");
+    else
+        line += u' ' + quoted(action.text());
+    if (!action.shortcut().isEmpty())
+        line += QStringLiteral(" shortcut ") + action.shortcut().toString();
+    if (action.isCheckable())
+        line += action.isChecked() ? QStringLiteral(" checked") : QStringLiteral(" unchecked");
+    if (!action.isEnabled())
+        line += QStringLiteral(" disabled");
+    if (!action.isVisible())
+        line += QStringLiteral(" hidden");
+    lines << line;
+    if (QMenu* menu = action.menu(); menu && menu->objectName() != action.objectName())
+        for (const QAction* child : menu->actions())
+            dumpAction(*child, depth + 1, lines);
+}
+
+QString describe(const QWidget& w) {
+    QString line = QString::fromLatin1(w.metaObject()->className()) + u' ' + w.objectName();
+    if (w.isWindow() && !w.windowTitle().isEmpty())
+        line += QStringLiteral(" title ") + quoted(w.windowTitle());
+    if (const auto* box = qobject_cast<const QGroupBox*>(&w))
+        line += u' ' + quoted(box->title());
+    else if (const auto* button = qobject_cast<const QAbstractButton*>(&w)) {
+        line += u' ' + quoted(button->text());
+        if (button->isCheckable())
+            line += button->isChecked() ? QStringLiteral(" checked") : QStringLiteral(" unchecked");
+    } else if (const auto* label = qobject_cast<const QLabel*>(&w)) {
+        if (!label->text().isEmpty())
+            line += u' ' + quoted(label->text());
+    } else if (const auto* edit = qobject_cast<const QLineEdit*>(&w)) {
+        line += u' ' + quoted(edit->text());
+        if (!edit->placeholderText().isEmpty())
+            line += QStringLiteral(" placeholder ") + quoted(edit->placeholderText());
+    } else if (const auto* combo = qobject_cast<const QComboBox*>(&w)) {
+        QStringList items;
+        for (int i = 0; i < combo->count(); ++i)
+            items << combo->itemText(i);
+        line += QStringLiteral(" [%1] current %2").arg(items.join(QStringLiteral(" | ")))
+                    .arg(combo->currentIndex());
+    } else if (const auto* tabs = qobject_cast<const QTabWidget*>(&w)) {
+        QStringList captions;
+        for (int i = 0; i < tabs->count(); ++i)
+            captions << tabs->tabText(i);
+        line += QStringLiteral(" tabs [%1] current %2").arg(captions.join(QStringLiteral(" | ")))
+                    .arg(tabs->currentIndex());
+    } else if (const auto* tree = qobject_cast<const QTreeWidget*>(&w)) {
+        QStringList headers;
+        for (int i = 0; i < tree->columnCount(); ++i)
+            headers << tree->headerItem()->text(i) + u'/' + tree->headerItem()->toolTip(i);
+        line += QStringLiteral(" columns [%1]").arg(headers.join(QStringLiteral(" | ")));
+    }
+    if (!w.toolTip().isEmpty())
+        line += QStringLiteral(" tip ") + quoted(w.toolTip());
+    if (w.testAttribute(Qt::WA_ForceDisabled))
+        line += QStringLiteral(" disabled");
+    if (w.isHidden() && !w.isWindow())
+        line += QStringLiteral(" hidden");
+    return line;
+}
+
+void dumpWidget(const QWidget& w, int depth, QStringList& lines) {
+    const bool bNamed = !w.objectName().isEmpty() && !w.objectName().startsWith(u"qt_");
+    if (bNamed)
+        lines << QString(depth * 2, u' ') + describe(w);
+    const int inner = bNamed ? depth + 1 : depth;
+    for (const QAction* action : w.actions())
+        if (!qobject_cast<const QMenu*>(&w) || action->menu() == nullptr)
+            dumpAction(*action, inner, lines);
+    for (const QObject* child : w.children()) {
+        if (const auto* widget = qobject_cast<const QWidget*>(child)) {
+            if (const auto* menu = qobject_cast<const QMenu*>(widget)) {
+                lines << QString(inner * 2, u' ') + QStringLiteral("QMenu ") + menu->objectName() +
+                             u' ' + quoted(menu->title());
+                for (const QAction* action : menu->actions())
+                    dumpAction(*action, inner + 1, lines);
+                continue;
+            }
+            dumpWidget(*widget, inner, lines);
+        }
+    }
+}
+
+QString goldenPath(const QString& name) {
+    const QByteArray source = qgetenv("LUM_SOURCE_DIR");
+    const QString root = !source.isEmpty()
+                             ? QString::fromLocal8Bit(source)
+                             : QFileInfo(QStringLiteral(__FILE__)).absolutePath() +
+                                   QStringLiteral("/../..");
+    return QDir::cleanPath(root + QStringLiteral("/tests/golden/") + name + QStringLiteral(".txt"));
+}
+
+} // namespace
+
+QString dumpWidgetTree(const QWidget& window) {
+    QStringList lines;
+    dumpWidget(window, 0, lines);
+    return lines.join(u'\n') + u'\n';
+}
+
+QObject* findControl(const QObject& window, const QString& name, const char* className) {
+    for (QObject* object : window.findChildren<QObject*>(name))
+        if (object->inherits(className))
+            return object;
+    // A missing control would only crash the test further on; say which one and stop.
+    std::fprintf(stderr, "no %s %s in %s\n", className, qPrintable(name),
+                 qPrintable(window.objectName()));
+    std::abort();
+}
+
+void expectGolden(const QString& name, const QString& dump) {
+    const QString path = goldenPath(name);
+    if (!qgetenv("LUM_UPDATE_GOLDEN").isEmpty()) {
+        QFile out(path);
+        ASSERT_TRUE(out.open(QIODevice::WriteOnly | QIODevice::Truncate)) << path.toStdString();
+        out.write(dump.toUtf8());
+        return;
+    }
+    QFile in(path);
+    ASSERT_TRUE(in.open(QIODevice::ReadOnly))
+        << path.toStdString() << " is missing: run the test with LUM_UPDATE_GOLDEN=1";
+    EXPECT_EQ(QString::fromUtf8(in.readAll()).toStdString(), dump.toStdString())
+        << path.toStdString() << " is out of date: run the test with LUM_UPDATE_GOLDEN=1";
+}
