@@ -1,0 +1,149 @@
+#include "emulator/OptionRules.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+// Which of the keyboard, mouse, joystick and Stelladaptor boxes can be used ("kmjs", "-"
+// for a disabled box).
+QString usableDevices(const OptionStates& s) {
+    QString letters;
+    for (std::size_t i = 0; i < 4; ++i)
+        letters += QLatin1Char(s.pcDevices[i] ? "kmjs"[i] : '-');
+    return letters;
+}
+
+} // namespace
+
+TEST(OptionRules, ThePortsDecideTheLightGunTheDevicesAndTheLayouts) {
+    const struct {
+        int left, right;
+        bool lightGun;
+        const char* devices;
+        const char* leftLayout;
+    } cases[] = {
+        {0, 0, false, "kmjs", "Standard Control Layout"},
+        {3, 3, false, "k---", "Keyboard Control Layout"},   // Keypad: keyboard only
+        {12, 12, false, "----", "Standard Control Layout"}, // no controller
+        {0, 12, false, "kmjs", "Standard Control Layout"},
+        {11, 11, false, "-m--", "Standard Control Layout"}, // Amiga Mouse
+        {3, 5, true, "km--", "Keyboard Control Layout"},    // Keypad, LightGun
+        {2, 4, false, "kmjs", "Paddle Control Layout"},     // Paddle, Driving
+        {4, 6, false, "kmjs", "Driving Control Layout"},    // Driving, CompuMate
+        {-1, 5, true, "-m--", nullptr},                     // nothing selected on the left
+    };
+    for (const auto& c : cases) {
+        EmulatorOptions o;
+        o.leftController = c.left;
+        o.rightController = c.right;
+        const OptionStates s = optionStates(o);
+        SCOPED_TRACE(testing::Message() << c.left << ' ' << c.right);
+        EXPECT_EQ(s.lightGun, c.lightGun);
+        EXPECT_EQ(usableDevices(s), c.devices);
+        // The keyboard paddle needs a keyboard.
+        EXPECT_EQ(s.keyboardPaddle, c.devices[0] == 'k');
+        EXPECT_STREQ(s.leftLayout, c.leftLayout);
+    }
+}
+
+TEST(OptionRules, FieldsFollowTheirBoxesAndTheKeyboardPaddleAnExactCheck) {
+    EmulatorOptions o;
+    OptionStates s = optionStates(o);
+    EXPECT_FALSE(s.scanLinesField || s.startLineField || s.lowerSensitivityField ||
+                 s.customFrameRateField);
+    EXPECT_TRUE(s.keyboardPaddle);
+    o.scanLineLimit = o.startLineEnabled = o.lowerSensitivity = Check::Grayed;
+    o.frameRate = FrameRate::Custom;
+    o.inactiveKeyboard = Check::Grayed;
+    s = optionStates(o);
+    EXPECT_TRUE(s.scanLinesField && s.startLineField && s.lowerSensitivityField &&
+                s.customFrameRateField && s.keyboardPaddle);
+    o.frameRate = FrameRate::Monitor;
+    o.inactiveKeyboard = Check::On;
+    s = optionStates(o);
+    EXPECT_FALSE(s.customFrameRateField || s.keyboardPaddle);
+}
+
+TEST(OptionRules, TidyingGivesTheNumberFieldsTheirLeadingNumber) {
+    for (const auto& [typed, tidy] :
+         {std::pair{"0012", "12"}, {"", "0"}, {"2.50", "2.5"}, {"12abc", "12"}, {"abc", "0"}}) {
+        EmulatorOptions o;
+        o.scanLines = o.startLine = o.lightGunCycles = o.lightGunScanlines = typed;
+        o.customFrameRate = o.lowerSensitivityBy = typed;
+        const EmulatorOptions t = withTidyNumbers(o);
+        EXPECT_EQ(t.scanLines + t.startLine + t.lightGunCycles + t.lightGunScanlines,
+                  QString(tidy).repeated(4))
+            << typed;
+        // The frame rate and lower sensitivity keep what was typed; they may stay empty.
+        EXPECT_EQ(t.customFrameRate + t.lowerSensitivityBy, QString(typed).repeated(2)) << typed;
+    }
+}
+
+TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
+    const LaunchGuard noControllers{
+        "It's going to be difficult playing the game\nwith all the available Controllers "
+        "inactive\n\nDo you still want to load the ROM?",
+        "Controls",
+        "txtIPC4Balloon",
+        1,
+        "There Are No Active Controllers",
+        "Allowing at least one controller to be\r\nactive will make gameplay much easier."};
+    const LaunchGuard lowerZero{"", "PaddlesAudio", "txtLowerSens",
+                                3,  "Zero Value",   "Number Cannot Be Zero"};
+    const LaunchGuard rateZero{"", "Video",      "txtFPScustom",
+                               3,  "Zero Value", "Number Cannot Be Zero"};
+    const struct {
+        const char* what;
+        void (*edit)(EmulatorOptions&);
+        std::vector<LaunchGuard> guards;
+    } cases[] = {
+        {"start", [](EmulatorOptions&) {}, {}},
+        {"every device switched off",
+         [](EmulatorOptions& o) {
+             o.inactiveKeyboard = o.inactiveMouse = Check::On;
+             o.inactiveJoystick = o.inactiveStelladaptor = Check::On;
+         },
+         {noControllers}},
+        {"no controller on either port",
+         [](EmulatorOptions& o) { o.leftController = o.rightController = 12; },
+         {noControllers}},
+        {"grayed boxes leave a device in play",
+         [](EmulatorOptions& o) {
+             o.inactiveKeyboard = o.inactiveMouse = Check::On;
+             o.inactiveJoystick = o.inactiveStelladaptor = Check::Grayed;
+         },
+         {}},
+        {"lower sensitivity of zero",
+         [](EmulatorOptions& o) {
+             o.lowerSensitivity = Check::On;
+             o.lowerSensitivityBy = "0";
+         },
+         {lowerZero}},
+        {"grayed lower sensitivity",
+         [](EmulatorOptions& o) {
+             o.lowerSensitivity = Check::Grayed;
+             o.lowerSensitivityBy = "0";
+         },
+         {}},
+        {"empty custom rate",
+         [](EmulatorOptions& o) { o.frameRate = FrameRate::Custom; },
+         {rateZero}},
+        {"all at once, in the order they are met",
+         [](EmulatorOptions& o) {
+             o.leftController = o.rightController = 12;
+             o.lowerSensitivity = Check::On;
+             o.lowerSensitivityBy = "";
+             o.frameRate = FrameRate::Custom;
+             o.customFrameRate = "abc";
+         },
+         {noControllers, lowerZero, rateZero}},
+    };
+    for (const auto& c : cases) {
+        EmulatorOptions o;
+        c.edit(o);
+        const std::vector<LaunchGuard> guards = launchGuards(o);
+        ASSERT_EQ(guards.size(), c.guards.size()) << c.what;
+        for (std::size_t i = 0; i < guards.size(); ++i)
+            EXPECT_TRUE(guards[i] == c.guards[i]) << c.what << ' ' << i;
+    }
+}

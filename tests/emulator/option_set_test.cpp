@@ -1,0 +1,327 @@
+#include "support/DiskFull.h"
+#include "support/Files.h"
+#include "support/Unreadable.h"
+
+#include "emulator/OptionFile.h"
+
+#include <QDir>
+#include <QFile>
+#include <QRandomGenerator>
+#include <QTemporaryDir>
+#include <QtEndian>
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <vector>
+
+#include <sys/stat.h>
+
+namespace {
+
+using O = EmulatorOptions;
+
+// Options where every value differs from its neighbours' and from the start.
+EmulatorOptions knownOptions() {
+    EmulatorOptions o;
+    o.videoMode = 3;
+    o.videoStart = VideoStart::Fullscreen;
+    o.dsp = DspLevel::High;
+    o.player0Hard = Check::On;
+    o.player1Hard = Check::Grayed;
+    o.blackAndWhite = Check::Off;
+    o.screenCapture = CaptureFormat::Bmp;
+    o.lightGun = Check::On;
+    o.lightGunCycles = "1.5";
+    o.lightGunScanlines = "-2.5";
+    o.quiet = Check::On;
+    o.paddleSensitivity = 8;
+    o.keyboardPaddle = Paddle::P1;
+    o.mousePaddle1 = Paddle::P0;
+    o.mousePaddle2 = Paddle::P3;
+    o.palColorLoss = Check::On;
+    o.interlaced = Check::Grayed;
+    o.frameRate = FrameRate::Custom;
+    o.customFrameRate = "60";
+    o.narrow = NarrowMode::Mode2;
+    o.palette = Palette::Secam;
+    o.scanLineLimit = Check::On;
+    o.scanLines = "262";
+    o.showScanline = Check::Grayed;
+    o.codeTrace = Check::On;
+    o.printChecksum = Check::Grayed;
+    o.noFastCopy = Check::On;
+    o.allow4Directions = Check::Grayed;
+    o.gameType = 13;
+    o.startLineEnabled = Check::On;
+    o.startLine = "30";
+    o.syncWithSound = Check::On;
+    o.leftController = 2;
+    o.rightController = -1;
+    o.inactiveKeyboard = Check::On;
+    o.inactiveMouse = Check::Grayed;
+    o.inactiveJoystick = Check::On;
+    o.inactiveStelladaptor = Check::Grayed;
+    o.swapPorts = Check::On;
+    o.lowerSensitivity = Check::On;
+    o.lowerSensitivityBy = "0.25";
+    return o;
+}
+
+// The file of knownOptions(), written out by hand: offset and little-endian bytes. Singles
+// as IEEE bits: 1.5 = 3FC00000, -2.5 = C0200000, 4608 = 45900000, 8 = 41000000,
+// 60 = 42700000, 77 = 429A0000, 262 = 43830000, 30 = 41F00000, 0.25 = 3E800000.
+// clang-format off
+const std::vector<std::pair<int, std::vector<unsigned char>>> kKnownBytes = {
+    {0, {3, 0}}, {2, {0, 0}}, {4, {0xFF, 0xFF}}, {6, {0, 0}}, {8, {0, 0}},
+    {10, {0, 0}}, {12, {0xFF, 0xFF}}, {14, {1, 0}}, {16, {2, 0}}, {18, {0, 0}},
+    {20, {0, 0}}, {22, {0xFF, 0xFF}}, {42, {1, 0}}, {44, {0, 0, 0xC0, 0x3F}},
+    {48, {0, 0, 0x20, 0xC0}}, {52, {1, 0}}, {54, {0, 0, 0x90, 0x45}},
+    {60, {0, 0, 0, 0x41}}, {68, {0, 0}}, {70, {0xFF, 0xFF}}, {72, {0, 0}},
+    {74, {0, 0}}, {76, {0xFF, 0xFF}}, {78, {0, 0}}, {80, {0, 0}}, {82, {0, 0}},
+    {84, {0, 0}}, {86, {0, 0}}, {88, {0, 0}}, {90, {0xFF, 0xFF}}, {92, {1, 0}},
+    {94, {2, 0}}, {96, {0, 0}}, {98, {0, 0}}, {100, {0xFF, 0xFF}},
+    {102, {0, 0, 0x70, 0x42}}, {106, {0, 0}}, {108, {0, 0}}, {110, {0xFF, 0xFF}},
+    {112, {0, 0}}, {114, {0, 0}}, {116, {0, 0}}, {118, {0xFF, 0xFF}},
+    {120, {0, 0, 0x9A, 0x42}}, {124, {1, 0}}, {126, {0, 0, 0x83, 0x43}},
+    {130, {1, 0}}, {132, {2, 0}}, {134, {1, 0}}, {136, {2, 0}}, {138, {1, 0}},
+    {140, {2, 0}}, {142, {13, 0}}, {144, {1, 0}}, {146, {0, 0, 0xF0, 0x41}},
+    {150, {1, 0}}, {152, {2, 0}}, {154, {0xFF, 0xFF}}, {156, {1, 0}}, {158, {2, 0}},
+    {160, {1, 0}}, {162, {2, 0}}, {164, {1, 0}}, {166, {1, 0}},
+    {168, {0, 0, 0x80, 0x3E}},
+};
+// clang-format on
+
+bool unused(int offset) {
+    return (offset >= 24 && offset < 42) || (offset >= 58 && offset < 60) ||
+           (offset >= 64 && offset < 68);
+}
+
+void putInt16(QByteArray& data, int offset, qint16 value) {
+    qToLittleEndian<qint16>(value, reinterpret_cast<uchar*>(data.data()) + offset);
+}
+
+void putSingle(QByteArray& data, int offset, float value) {
+    qToLittleEndian<float>(value, reinterpret_cast<uchar*>(data.data()) + offset);
+}
+
+} // namespace
+
+TEST(OptionSet, EveryOptionLandsAtItsOffsetAndUnusedBytesAreZero) {
+    const QByteArray data = encodeOptions(knownOptions());
+    ASSERT_EQ(data.size(), 172);
+    std::vector<int> described(172, 0);
+    for (const auto& [offset, bytes] : kKnownBytes)
+        for (std::size_t i = 0; i < bytes.size(); ++i) {
+            EXPECT_EQ(static_cast<unsigned char>(data[offset + int(i)]), bytes[i])
+                << "byte " << offset + int(i);
+            ++described[static_cast<std::size_t>(offset) + i];
+        }
+    for (int at = 0; at < 172; ++at) {
+        EXPECT_EQ(described[std::size_t(at)], unused(at) ? 0 : 1) << "byte " << at;
+        if (unused(at)) {
+            EXPECT_EQ(data[at], '\0') << "byte " << at;
+        }
+    }
+}
+
+TEST(OptionSet, ReadsBackWhateverTheUnusedBytesHold) {
+    QByteArray data = encodeOptions(knownOptions());
+    for (int at = 0; at < 172; ++at)
+        if (unused(at))
+            data[at] = char(0xA5);
+    data += QByteArray(10, '\x7F'); // bytes after the record are no part of it
+    const OptionSetRead read = decodeOptions(data, EmulatorOptions());
+    ASSERT_TRUE(read.ok());
+    EXPECT_EQ(read.options, knownOptions());
+    EXPECT_EQ(encodeOptions(read.options), encodeOptions(knownOptions()));
+}
+
+TEST(OptionSet, FlagsSelectTheLastSetButtonOrTheGroupsStart) {
+    QByteArray data = encodeOptions(EmulatorOptions());
+    putInt16(data, 2, 1);              // "Default" video start, any non-zero value
+    putInt16(data, 4, qint16(0x8000)); // and "Fullscreen" after it
+    putInt16(data, 70, 7);             // keyboard paddle 1
+    putInt16(data, 96, 0);             // no frame rate button at all
+    for (int offset = 76; offset < 84; offset += 2)
+        putInt16(data, offset, 0); // no paddle for the first mouse: "None"
+    EmulatorOptions base;
+    base.frameRate = FrameRate::Monitor;
+    base.mousePaddle1 = Paddle::P2;
+    const OptionSetRead read = decodeOptions(data, base);
+    ASSERT_TRUE(read.ok());
+    EXPECT_EQ(read.options.videoStart, VideoStart::Fullscreen);
+    EXPECT_EQ(read.options.keyboardPaddle, Paddle::P1);
+    EXPECT_EQ(read.options.frameRate, FrameRate::Default);
+    EXPECT_EQ(read.options.mousePaddle1, Paddle::None);
+}
+
+// A value the window cannot show ends the load there: every option before it (in the order
+// a load applies them) comes from the file, every one from it on keeps the base's value.
+TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
+    const float nan = std::numeric_limits<float>::quiet_NaN();
+    const struct {
+        const char* what;
+        int offset;
+        bool bSingle;
+        float value;
+        bool bOk;
+        int (*applied)(const EmulatorOptions&); // a value set before the bad one
+        int (*kept)(const EmulatorOptions&);    // the bad one's own value, kept from the base
+    } cases[] = {
+        {"check box of 3", 14, false, 3, false, [](const O& o) { return int(o.dsp); },
+         [](const O& o) { return int(o.player0Hard); }},
+        {"check box of -1", 140, false, -1, false, [](const O& o) { return int(o.noFastCopy); },
+         [](const O& o) { return int(o.allow4Directions); }},
+        {"last video mode", 0, false, 8, true, nullptr, nullptr},
+        {"no video mode", 0, false, -1, true, nullptr, nullptr},
+        {"video mode past the list", 0, false, 9, false, nullptr,
+         [](const O& o) { return o.videoMode; }},
+        {"list entry below -1", 152, false, -2, false,
+         [](const O& o) { return int(o.screenCapture); },
+         [](const O& o) { return o.leftController; }},
+        {"controller past the list", 154, false, 13, false,
+         [](const O& o) { return o.leftController; }, [](const O& o) { return o.rightController; }},
+        {"game type past the list", 142, false, 14, false,
+         [](const O& o) { return int(o.allow4Directions); }, [](const O& o) { return o.gameType; }},
+        {"number not a number", 102, true, nan, false, [](const O& o) { return int(o.frameRate); },
+         [](const O& o) { return int(o.customFrameRate.size()); }},
+        {"slider beyond 32 bits", 60, true, 3e9f, false,
+         [](const O& o) { return int(o.inactiveStelladaptor); },
+         [](const O& o) { return o.paddleSensitivity; }},
+        {"sound queue outside its hundreds", 54, true, 12.5f, false,
+         [](const O& o) { return int(o.quiet); }, [](const O& o) { return o.soundQueue; }},
+    };
+    EmulatorOptions base;
+    base.videoMode = 7;
+    base.dsp = DspLevel::Low;
+    base.player0Hard = base.allow4Directions = base.inactiveStelladaptor = Check::Grayed;
+    base.leftController = base.rightController = 9;
+    base.gameType = 11;
+    base.customFrameRate = "12345";
+    base.paddleSensitivity = 3;
+    base.soundQueue = 777;
+    for (const auto& c : cases) {
+        QByteArray data = encodeOptions(knownOptions());
+        if (c.bSingle)
+            putSingle(data, c.offset, c.value);
+        else
+            putInt16(data, c.offset, static_cast<qint16>(c.value));
+        const OptionSetRead read = decodeOptions(data, base);
+        EXPECT_EQ(read.ok(), c.bOk) << c.what;
+        EXPECT_EQ(read.status == OptionSetRead::Status::Invalid, !c.bOk) << c.what;
+        if (c.applied) {
+            EXPECT_EQ(c.applied(read.options), c.applied(knownOptions())) << c.what;
+        }
+        if (c.kept) {
+            EXPECT_EQ(c.kept(read.options), c.kept(base)) << c.what;
+        }
+    }
+    // A slider takes the nearest whole number, halves to the even one.
+    for (const auto& [stored, shown] : {std::pair{8.5f, 8}, {7.5f, 8}, {-0.4f, 0}}) {
+        QByteArray data = encodeOptions(knownOptions());
+        putSingle(data, 120, stored);
+        EXPECT_EQ(decodeOptions(data, base).options.phosphor, shown) << stored;
+    }
+}
+
+TEST(OptionSet, SoundQueueRangeIsCentredOnTheStoredHundreds) {
+    const struct {
+        float stored;
+        std::optional<SliderScale> scale;
+    } cases[] = {
+        {4608, SliderScale{4500, 4700, 4608}},
+        {50, SliderScale{-100, 100, 50}},
+        {150, SliderScale{0, 200, 150}},
+        {65536, SliderScale{65400, 65600, 65536}},
+        {-5, SliderScale{-100, 100, -5}},
+        // A fraction: the hundreds do not frame the value (12 lies outside 1100 to 1300).
+        {12.5f, std::nullopt},
+        {3839.625f, std::nullopt},
+        {0.5f, SliderScale{-100, 100, 0}},
+        {-0.75f, SliderScale{-100, 100, -1}},
+        {5, SliderScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives
+        {1e12f, std::nullopt},
+        {std::numeric_limits<float>::quiet_NaN(), std::nullopt},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(soundQueueScaleFor(c.stored), c.scale) << c.stored;
+}
+
+// Random sets either load or stop at a bad value; whatever a load takes, a save gives
+// back as a set that loads and saves the same. (Found by fuzzing the load: a sound
+// queue of one digit.)
+TEST(OptionSet, WhateverLoadsSavesAsASetThatLoadsTheSame) {
+    QRandomGenerator random(2600);
+    for (int n = 0; n < 2000; ++n) {
+        QByteArray bytes(172, '\0');
+        for (char& c : bytes)
+            c = static_cast<char>(random.bounded(256));
+        // Small values in the int16 options now and then, so that loads get further.
+        for (int offset = 0; offset < 172; offset += 2)
+            if (random.bounded(3) != 0)
+                putInt16(bytes, offset, static_cast<qint16>(random.bounded(3)));
+        const OptionSetRead read = decodeOptions(bytes, EmulatorOptions());
+        const OptionSetRead again = decodeOptions(encodeOptions(read.options), EmulatorOptions());
+        ASSERT_TRUE(again.ok()) << n;
+        EXPECT_EQ(encodeOptions(again.options), encodeOptions(read.options)) << n;
+    }
+}
+
+TEST(OptionFile, SourcesWithoutAWholeSetApplyNothing) {
+    QTemporaryDir dir;
+    const QByteArray good = encodeOptions(knownOptions());
+    const QString shortFile = dir.filePath("short.lum");
+    ASSERT_TRUE(putFile(shortFile, good.left(171)));
+    const QString fifo = dir.filePath("pipe.lum");
+    ASSERT_EQ(mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
+    const QString locked = makeUnreadable(dir.filePath("locked.lum"), good);
+    ASSERT_FALSE(locked.isEmpty());
+    const QString huge = dir.filePath("huge.lum");
+    {
+        QFile file(huge);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(good);
+        ASSERT_TRUE(file.resize(qint64(1) << 30)); // sparse: read for its first set only
+    }
+    using S = OptionSetRead::Status;
+    const struct {
+        QString path;
+        S status;
+    } cases[] = {
+        {shortFile, S::Short},   {dir.filePath("absent.lum"), S::Unreadable},
+        {locked, S::Unreadable}, {dir.path(), S::Unreadable},
+        {fifo, S::Unreadable}, // a pipe would block a reader: refused unopened
+        {huge, S::Ok},
+    };
+    for (const auto& c : cases) {
+        const OptionSetRead read = readOptionFile(c.path, EmulatorOptions());
+        EXPECT_EQ(read.status, c.status) << qPrintable(c.path);
+        EXPECT_EQ(read.options, c.status == S::Ok ? knownOptions() : EmulatorOptions())
+            << qPrintable(c.path);
+    }
+}
+
+TEST(OptionFile, AWriteReplacesTheFileWholeOrLeavesItAsItWas) {
+    QTemporaryDir dir;
+    const QString path = dir.filePath("set.lum");
+    // An older, longer file with junk everywhere, unused bytes included.
+    ASSERT_TRUE(putFile(path, QByteArray(300, '\x5A')));
+    ASSERT_TRUE(writeOptionFile(path, knownOptions()));
+    EXPECT_EQ(fileBytes(path), encodeOptions(knownOptions()));
+    {
+        const DiskFull limit(100);
+        EXPECT_FALSE(writeOptionFile(path, EmulatorOptions()));
+    }
+    EXPECT_EQ(fileBytes(path), encodeOptions(knownOptions()));
+    // No temporary file stays behind.
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files), QStringList{"set.lum"});
+
+    const QString plain = dir.filePath("plain");
+    ASSERT_TRUE(putFile(plain, "x"));
+    QDir(dir.path()).mkdir("taken.lum");
+    for (const QString& target :
+         {dir.filePath("missing/set.lum"), plain + "/set.lum", dir.filePath("taken.lum")})
+        EXPECT_FALSE(writeOptionFile(target, knownOptions())) << qPrintable(target);
+}
