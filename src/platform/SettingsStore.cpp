@@ -59,7 +59,11 @@ bool readBool(const SettingsStore& store, const QString& section, const QString&
 
 quint32 readColour(const SettingsStore& store, const QString& section, const QString& key,
                    quint32 def) {
-    const std::optional<qint64> value = tryParseLong(store.GetSetting(section, key, QString()));
+    return parseColour(store.GetSetting(section, key, QString()), def);
+}
+
+quint32 parseColour(const QString& text, quint32 def) {
+    const std::optional<qint64> value = tryParseLong(text);
     // Colours are 32-bit; a stored value outside that range is not a colour.
     if (!value || *value < std::numeric_limits<qint32>::min() ||
         *value > std::numeric_limits<quint32>::max())

@@ -24,6 +24,8 @@ std::optional<qint64> tryParseLong(const QString& text);
 double parseSingle(const QString& text, double def);
 qint64 parseLong(const QString& text, qint64 def);
 bool parseBool(const QString& text, bool def);
+// An OLE colour (0x00BBGGRR, or a system colour with the top bit set) as stored in decimal.
+quint32 parseColour(const QString& text, quint32 def);
 
 double readSingle(const SettingsStore& store, const QString& section, const QString& key,
                   double def);

@@ -1,0 +1,91 @@
+#pragma once
+
+#include "platform/SettingsStore.h"
+
+#include <QString>
+#include <QStringList>
+
+#include <vector>
+
+// Every value lum keeps in its settings store, each with its section, key, type and the one
+// default a reader gets when the key is missing or its text does not convert. Readers and
+// writers go through these, so no key is spelled anywhere else. (The subsystems below the
+// application read some of them too, which is why they live beside the store.)
+
+struct TextSetting {
+    const char* section;
+    const char* key;
+    const char* fallback;
+};
+struct BoolSetting {
+    const char* section;
+    const char* key;
+    bool fallback;
+};
+// An OLE colour number (0x00BBGGRR, or a system colour with the top bit set).
+struct ColourSetting {
+    const char* section;
+    const char* key;
+    quint32 fallback;
+};
+
+// A window's place in twips: its keys "top", "left" and, for a window that keeps its size,
+// "width" and "height".
+struct WindowPlace {
+    double top = 0;
+    double left = 0;
+    double width = 0;
+    double height = 0;
+};
+struct PlaceSetting {
+    const char* section;
+    WindowPlace fallback;
+    bool bSized;
+};
+
+namespace stored {
+
+inline constexpr TextSetting z26Path{"Settings", "Z26Path", ""};
+inline constexpr TextSetting romFilter{"Settings", "ROMFilter", "*.bin"};
+inline constexpr ColourSetting backColor{"Settings", "BackColor", 0xFFFFFF};
+inline constexpr ColourSetting textColor{"Settings", "TextColor", 0};
+inline constexpr TextSetting backImg{"Settings", "BackImg", ""};
+inline constexpr BoolSetting backImgEnabled{"Settings", "BackImgEnabled", true};
+
+inline constexpr PlaceSetting mainWindow{"winpos", {500, 500, 4905, 6570}, true};
+inline constexpr BoolSetting mainWindowMaximized{"winpos", "max", false};
+inline constexpr PlaceSetting settingsWindow{"setpos", {250, 250, 0, 0}, false};
+inline constexpr PlaceSetting pictureWindow{"picpos", {300, 300, 11115, 5655}, true};
+
+} // namespace stored
+
+QString read(const SettingsStore& store, const TextSetting& setting);
+bool read(const SettingsStore& store, const BoolSetting& setting);
+quint32 read(const SettingsStore& store, const ColourSetting& setting);
+WindowPlace read(const SettingsStore& store, const PlaceSetting& setting);
+
+// Each returns false when the store could not keep the value.
+bool write(SettingsStore& store, const TextSetting& setting, const QString& value);
+bool write(SettingsStore& store, const BoolSetting& setting, bool value);
+bool write(SettingsStore& store, const ColourSetting& setting, quint32 value);
+bool write(SettingsStore& store, const PlaceSetting& setting, const WindowPlace& place);
+
+// The ROM folders, kept as numbered entries in "Settings": ROMPath, ROM2Path, ROM3Path, ...
+// with the flags ROMChecked, ROM2Checked, ... (missing: off).
+struct RomFolder {
+    QString path;
+    bool enabled = false;
+
+    bool operator==(const RomFolder&) const = default;
+};
+
+// The entries from 1 up to, not including, the first empty or missing path. Later ones
+// are unreachable, for every reader alike.
+std::vector<RomFolder> readRomFolders(const SettingsStore& store);
+
+// Writes entries 1..k and then an empty path for entry k + 1, which ends the list even when
+// a longer one was stored before. The flag of entry k + 1 is left alone.
+void writeRomFolders(SettingsStore& store, const std::vector<RomFolder>& folders);
+
+// The enabled folders' paths, in their stored order.
+QStringList enabledRomFolders(const SettingsStore& store);
