@@ -1,16 +1,8 @@
 #include "settings/DefaultPaths.h"
 
-#include "platform/SettingsStore.h"
-
 #include <QFileInfo>
 
 namespace {
-
-const QString kSettings = QStringLiteral("Settings");
-
-QString entryKey(int n, QLatin1String suffix) {
-    return QStringLiteral("ROM") + (n == 1 ? QString() : QString::number(n)) + suffix;
-}
 
 // "/z26": how a path that already names the emulator ends.
 QString z26Suffix() {
@@ -24,39 +16,6 @@ QString withoutTrailingSeparators(QString path) {
 }
 
 } // namespace
-
-QString storedRomFilter(const SettingsStore& store) {
-    return store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.bin"));
-}
-
-QString romPathKey(int n) {
-    return entryKey(n, QLatin1String("Path"));
-}
-
-QString romCheckedKey(int n) {
-    return entryKey(n, QLatin1String("Checked"));
-}
-
-std::vector<RomFolder> readRomFolders(const SettingsStore& store) {
-    std::vector<RomFolder> folders;
-    for (int n = 1;; ++n) {
-        QString path = store.GetSetting(kSettings, romPathKey(n));
-        if (path.isEmpty())
-            break;
-        folders.push_back({std::move(path), readBool(store, kSettings, romCheckedKey(n), false)});
-    }
-    return folders;
-}
-
-void writeRomFolders(SettingsStore& store, const std::vector<RomFolder>& folders) {
-    int n = 1;
-    for (const RomFolder& folder : folders) {
-        store.SaveSetting(kSettings, romPathKey(n), folder.path);
-        store.SaveSetting(kSettings, romCheckedKey(n), boolText(folder.enabled));
-        ++n;
-    }
-    store.SaveSetting(kSettings, romPathKey(n), QString());
-}
 
 std::vector<RomFolder> loadExistingRomFolders(SettingsStore& store) {
     std::vector<RomFolder> folders = readRomFolders(store);

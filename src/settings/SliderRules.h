@@ -1,5 +1,7 @@
 #pragma once
 
+#include "emulator/OptionFile.h"
+
 #include <QLocale>
 #include <QString>
 
@@ -7,19 +9,13 @@
 // ranges and defaults, the sound queue's movable scale and the texts the bars show.
 namespace sliders {
 
-// Keyboard paddle sensitivity. It has no default of its own (a loaded configuration sets
-// it); before any load the bar starts in the middle of its range.
+// Keyboard paddle sensitivity and phosphorescent effect.
 inline constexpr int kPaddleMin = 1;
 inline constexpr int kPaddleMax = 15;
-inline constexpr int kPaddleStart = 8;
-
-// Phosphorescent effect.
 inline constexpr int kPhosMin = 0;
 inline constexpr int kPhosMax = 100;
-inline constexpr int kPhosDefault = 77;
 
 // Size of the sound queue: the bar shows a window of 200 of the whole scale 1..65536.
-inline constexpr int kSoundQueueDefault = 4608;
 inline constexpr int kSoundQueueDefaultMin = 4500;
 inline constexpr int kSoundQueueDefaultMax = 4700;
 inline constexpr int kSoundQueueLowest = 1;
@@ -30,13 +26,7 @@ inline constexpr int kSoundQueueStep = 100;
 inline constexpr int kKeyShiftUp = '+';
 inline constexpr int kKeyShiftDown = '-';
 
-// A bar's visible window and its value.
-struct Scale {
-    int min = 0;
-    int max = 0;
-    int value = 0;
-    bool operator==(const Scale&) const = default;
-};
+using Scale = SliderScale;
 
 // The sound queue's window and value as a reset leaves them: 4500..4700 at 4608.
 Scale SoundQueueDefault();

@@ -1,16 +1,18 @@
-#include "settings/frmSettings.h"
+#include "settings/frmSettingsUi.h"
 
 #include "platform/Dialogs.h"
 #include "platform/Platform.h"
-#include "platform/SettingsStore.h"
+#include "platform/StoredSettings.h"
 #include "settings/DefaultPaths.h"
 #include "ui/OleColor.h"
 #include "ui/PictureBox.h"
 #include "ui/Twips.h"
+#include "ui/cTextBoxXP.h"
 
 #include <QCheckBox>
 #include <QCloseEvent>
 #include <QComboBox>
+#include <QCoreApplication>
 #include <QDir>
 #include <QDropEvent>
 #include <QFileInfo>
@@ -35,8 +37,6 @@ constexpr double kTabHeightTwips = 4095;
 constexpr double kSideStripWidthTwips = 495;
 constexpr double kCountColumnTwips = 1000;
 
-const QString kSettings = QStringLiteral("Settings");
-const QString kSetpos = QStringLiteral("setpos");
 const QString kDefaultPathsKey = QStringLiteral("DefaultPaths");
 
 struct TabInfo {
@@ -68,29 +68,27 @@ QString firstDroppedPath(const QMimeData* data) {
 } // namespace
 
 frmSettings::frmSettings(Platform& platform, QWidget* parent)
-    : QWidget(parent, Qt::Window), m_platform(platform) {
+    : QWidget(parent, Qt::Window), m_platform(platform), m_ui(std::make_unique<Ui>()) {
     setObjectName(QStringLiteral("frmSettings"));
     setWindowTitle(QStringLiteral("Settings"));
 
-    picSideText = new PictureBox(this);
-    picSideText->setObjectName(QStringLiteral("picSideText"));
+    m_ui->picSideText = new PictureBox(this);
+    m_ui->picSideText->setObjectName(QStringLiteral("picSideText"));
     // The caption runs up the dark end of the gradient.
-    picSideText->setForeColor(kOleWhite);
-    QFont sideFont = picSideText->font();
+    m_ui->picSideText->setForeColor(kOleWhite);
+    QFont sideFont = m_ui->picSideText->font();
     sideFont.setBold(true);
     sideFont.setPointSize(10);
-    picSideText->setFont(sideFont);
+    m_ui->picSideText->setFont(sideFont);
 
-    vbalDTabControl1 = new QTabWidget(this);
-    vbalDTabControl1->setObjectName(QStringLiteral("vbalDTabControl1"));
+    m_ui->vbalDTabControl1 = new QTabWidget(this);
+    m_ui->vbalDTabControl1->setObjectName(QStringLiteral("vbalDTabControl1"));
 
-    QWidget** pages[] = {&picSettings, &picControls, &picPaddlesAudio,
-                         &picVideo,    &picDebug,    &picDefPaths};
     const char* pageNames[] = {"picSettings", "picControls", "picPaddlesAudio",
                                "picVideo",    "picDebug",    "picDefPaths"};
-    for (size_t i = 0; i < std::size(pages); ++i) {
-        *pages[i] = new QWidget;
-        (*pages[i])->setObjectName(QLatin1String(pageNames[i]));
+    for (size_t i = 0; i < m_ui->pages.size(); ++i) {
+        m_ui->pages[i] = new QWidget;
+        m_ui->pages[i]->setObjectName(QLatin1String(pageNames[i]));
     }
     createSettingsPage();
     createControlsPage();
@@ -98,107 +96,124 @@ frmSettings::frmSettings(Platform& platform, QWidget* parent)
     createVideoPage();
     createDebugPage();
     createDefaultPathsPage();
-    createGraveyard();
+    createSoundQueueMenu();
 
     // Drops and keys of the Default Paths page; the balloon anchors follow the controls
     // whose tips they carry.
     for (QObject* watched :
-         {static_cast<QObject*>(txtDefPathz26), static_cast<QObject*>(vbalListDefPaths),
-          static_cast<QObject*>(vbalListDefPaths->viewport()),
-          static_cast<QObject*>(comboVideoMode), static_cast<QObject*>(chkIPCStella)})
+         {static_cast<QObject*>(m_ui->txtDefPathz26), static_cast<QObject*>(m_ui->vbalListDefPaths),
+          static_cast<QObject*>(m_ui->vbalListDefPaths->viewport()),
+          static_cast<QObject*>(m_ui->comboVideoMode), static_cast<QObject*>(m_ui->ipc[3])})
         watched->installEventFilter(this);
 
-    connect(vbalDTabControl1, &QTabWidget::tabBarClicked, this,
+    connect(m_ui->vbalDTabControl1, &QTabWidget::tabBarClicked, this,
             &frmSettings::vbalDTabControl1_TabClick);
-    connect(vbalDTabControl1, &QTabWidget::currentChanged, this,
+    connect(m_ui->vbalDTabControl1, &QTabWidget::currentChanged, this,
             &frmSettings::vbalDTabControl1_TabSelected);
-    connect(txtDefPathFilter, &QLineEdit::textChanged, this, &frmSettings::txtDefPathFilter_Change);
-    connect(cmdAddZ26Path, &QPushButton::clicked, this, &frmSettings::cmdAddZ26Path_Click);
-    connect(mnuROMSRemove, &QAction::triggered, this, &frmSettings::mnuROMSRemove_Click);
-    connect(mnuROMSRefresh, &QAction::triggered, this, &frmSettings::mnuROMSRefresh_Click);
-    connect(mnuROMSAdd, &QAction::triggered, this, &frmSettings::mnuROMSAdd_Click);
-    connect(vbalListDefPaths, &QWidget::customContextMenuRequested, this,
+    connect(m_ui->txtDefPathFilter, &QLineEdit::textChanged, this,
+            &frmSettings::txtDefPathFilter_Change);
+    connect(m_ui->vbalListDefPaths, &QWidget::customContextMenuRequested, this,
             [this](const QPoint& pos) { vbalListDefPaths_MouseDown(Qt::RightButton, pos); });
-    connect(vbalListDefPaths, &QTreeWidget::itemChanged, this,
+    connect(m_ui->vbalListDefPaths, &QTreeWidget::itemChanged, this,
             &frmSettings::vbalListDefPaths_ItemChanged);
 
     Form_Load();
     connectOptionControls();
-    connectConfigControls();
 }
 
 frmSettings::~frmSettings() = default;
 
+const cLogo& frmSettings::Logo() const {
+    return m_logo;
+}
+
 void frmSettings::Form_Load() {
-    txtDefPathFilter->setText(storedRomFilter(m_platform.store));
+    m_ui->txtDefPathFilter->setText(read(m_platform.store, stored::romFilter));
 
     // The path column takes what the count column leaves, so both stay in view.
-    vbalListDefPaths->setColumnCount(2);
-    vbalListDefPaths->setHeaderLabels({QStringLiteral("Path"), QStringLiteral("# ROM's")});
-    vbalListDefPaths->headerItem()->setToolTip(0, QStringLiteral("ROM's Path"));
-    vbalListDefPaths->headerItem()->setToolTip(1, QStringLiteral("The number of ROM's found"));
-    QHeaderView* header = vbalListDefPaths->header();
+    QTreeWidget* paths = m_ui->vbalListDefPaths;
+    paths->setColumnCount(2);
+    paths->setHeaderLabels({QStringLiteral("Path"), QStringLiteral("# ROM's")});
+    paths->headerItem()->setToolTip(0, QStringLiteral("ROM's Path"));
+    paths->headerItem()->setToolTip(1, QStringLiteral("The number of ROM's found"));
+    QHeaderView* header = paths->header();
     header->setStretchLastSection(false);
     header->setSectionResizeMode(0, QHeaderView::Stretch);
     header->setSectionResizeMode(1, QHeaderView::Interactive);
     header->resizeSection(1, twips::toPixelsX(kCountColumnTwips));
 
-    m_logo.setDrawingObject(picSideText);
+    m_logo.setDrawingObject(m_ui->picSideText);
     m_logo.setCaption(QStringLiteral("Settings"));
     m_logo.setStartColor(0);
     m_logo.setEndColor(kOleButtonFace);
 
-    const SettingsStore& store = m_platform.store;
-    move(twips::toPixelsX(readSingle(store, kSetpos, QStringLiteral("left"), 250)),
-         twips::toPixelsY(readSingle(store, kSetpos, QStringLiteral("top"), 250)));
+    const WindowPlace place = read(m_platform.store, stored::settingsWindow);
+    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
 
-    QWidget* pages[] = {picSettings, picControls, picPaddlesAudio, picVideo, picDebug, picDefPaths};
+    QTabWidget* tabs = m_ui->vbalDTabControl1;
     for (size_t i = 0; i < std::size(kTabs); ++i) {
-        const int index = vbalDTabControl1->addTab(pages[i], style()->standardIcon(kTabs[i].icon),
-                                                   QLatin1String(kTabs[i].caption));
-        vbalDTabControl1->tabBar()->setTabData(index, QLatin1String(kTabs[i].key));
+        const int index = tabs->addTab(m_ui->pages[i], style()->standardIcon(kTabs[i].icon),
+                                       QLatin1String(kTabs[i].caption));
+        tabs->tabBar()->setTabData(index, QLatin1String(kTabs[i].key));
     }
     placeTabControl();
 
     LoadDefaultPaths();
-    fillComboLists();
 }
 
 void frmSettings::placeTabControl() {
     // The tab control's size in twips, grown where this platform's font needs more room
     // for the tabs or a page, so that every tab shows at once and nothing is cut off.
-    const QSize content = vbalDTabControl1->minimumSizeHint().expandedTo(
-        QSize(vbalDTabControl1->tabBar()->sizeHint().width() + 4, 0));
+    const QSize content = m_ui->vbalDTabControl1->minimumSizeHint().expandedTo(
+        QSize(m_ui->vbalDTabControl1->tabBar()->sizeHint().width() + 4, 0));
     const int tabWidth = std::max(twips::toPixelsX(kTabWidthTwips), content.width());
     const int tabHeight = std::max(twips::toPixelsY(kTabHeightTwips), content.height());
     const int stripWidth = twips::toPixelsX(kSideStripWidthTwips);
-    vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
+    m_ui->vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
     // The pages are laid out for this size, so the window keeps it.
     setFixedSize(stripWidth + tabWidth + twips::toPixelsX(100), tabHeight + twips::toPixelsY(500));
-    picSideText->setGeometry(0, 0, stripWidth, height());
+    m_ui->picSideText->setGeometry(0, 0, stripWidth, height());
 }
 
-void frmSettings::SelectTab(const QString& key) {
-    for (int i = 0; i < vbalDTabControl1->count(); ++i) {
+void frmSettings::selectPage(const QString& key) {
+    for (int i = 0; i < m_ui->vbalDTabControl1->count(); ++i) {
         if (tabKey(i) == key) {
-            vbalDTabControl1->setCurrentIndex(i);
+            m_ui->vbalDTabControl1->setCurrentIndex(i);
             return;
         }
     }
 }
 
-QString frmSettings::SelectedTabKey() const {
-    return tabKey(vbalDTabControl1->currentIndex());
+QString frmSettings::selectedPage() const {
+    return tabKey(m_ui->vbalDTabControl1->currentIndex());
+}
+
+void frmSettings::showPage(const QString& key) {
+    show();
+    raise();
+    activateWindow();
+    selectPage(key);
+    QCoreApplication::processEvents();
+}
+
+void frmSettings::showBalloonTip(const QString& control, int icon, const QString& title,
+                                 const QString& text) {
+    cTextBoxXP tip;
+    tip.setTextBox(findChild<QWidget*>(control));
+    tip.setBalloonTipIcon(icon);
+    tip.setBalloonTipTitle(title);
+    tip.setBalloonTipText(text);
+    tip.ShowBalloonTip();
 }
 
 QString frmSettings::tabKey(int index) const {
-    return vbalDTabControl1->tabBar()->tabData(index).toString();
+    return m_ui->vbalDTabControl1->tabBar()->tabData(index).toString();
 }
 
 void frmSettings::vbalDTabControl1_TabClick(int index) {
     // Clicking the page already shown reloads it too; a change of page reloads through
     // vbalDTabControl1_TabSelected.
-    if (index == vbalDTabControl1->currentIndex() && tabKey(index) == kDefaultPathsKey)
+    if (index == m_ui->vbalDTabControl1->currentIndex() && tabKey(index) == kDefaultPathsKey)
         LoadDefaultPaths();
 }
 
@@ -208,7 +223,7 @@ void frmSettings::vbalDTabControl1_TabSelected(int index) {
     // Folders may have vanished from disk since the page was last filled.
     if (tabKey(index) == kDefaultPathsKey)
         LoadDefaultPaths();
-    m_logo.setCaption(vbalDTabControl1->tabText(index));
+    m_logo.setCaption(m_ui->vbalDTabControl1->tabText(index));
     m_logo.Draw();
 }
 
@@ -229,9 +244,8 @@ void frmSettings::closeEvent(QCloseEvent* event) {
 }
 
 void frmSettings::Form_Unload() {
-    SettingsStore& store = m_platform.store;
-    store.SaveSetting(kSetpos, QStringLiteral("top"), singleText(twips::fromPixelsY(y())));
-    store.SaveSetting(kSetpos, QStringLiteral("left"), singleText(twips::fromPixelsX(x())));
+    write(m_platform.store, stored::settingsWindow,
+          WindowPlace{twips::fromPixelsY(y()), twips::fromPixelsX(x())});
     SaveDefaultPaths();
 }
 
@@ -243,15 +257,15 @@ void frmSettings::resizeEvent(QResizeEvent* event) {
 void frmSettings::Form_Resize() {
     if (isMinimized())
         return;
-    picSideText->setGeometry(0, 0, picSideText->width(), height());
+    m_ui->picSideText->setGeometry(0, 0, m_ui->picSideText->width(), height());
     m_logo.Draw();
 }
 
 bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
-    if (optionControlEvent(watched, event))
+    if (numberFieldEvent(watched, event))
         return true;
-    const bool bFolderList = watched == vbalListDefPaths->viewport();
-    const bool bZ26Box = watched == txtDefPathz26;
+    const bool bFolderList = watched == m_ui->vbalListDefPaths->viewport();
+    const bool bZ26Box = watched == m_ui->txtDefPathz26;
     if (bFolderList || bZ26Box) {
         switch (event->type()) {
         case QEvent::DragEnter:
@@ -275,7 +289,7 @@ bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
         default:
             break;
         }
-    } else if (watched == vbalListDefPaths && event->type() == QEvent::KeyPress) {
+    } else if (watched == m_ui->vbalListDefPaths && event->type() == QEvent::KeyPress) {
         const int key = static_cast<QKeyEvent*>(event)->key();
         if (key == Qt::Key_Delete || key == Qt::Key_F5 || key == Qt::Key_Return ||
             key == Qt::Key_Enter) {
@@ -283,10 +297,10 @@ bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
             return true;
         }
     } else if (event->type() == QEvent::Move || event->type() == QEvent::Resize) {
-        if (watched == comboVideoMode)
-            txtVidModeBalloon->setGeometry(comboVideoMode->geometry());
-        else if (watched == chkIPCStella)
-            txtIPC4Balloon->setGeometry(chkIPCStella->geometry());
+        if (watched == m_ui->comboVideoMode)
+            m_ui->txtVidModeBalloon->setGeometry(m_ui->comboVideoMode->geometry());
+        else if (watched == m_ui->ipc[3])
+            m_ui->txtIPC4Balloon->setGeometry(m_ui->ipc[3]->geometry());
     }
     return QWidget::eventFilter(watched, event);
 }
@@ -294,13 +308,13 @@ bool frmSettings::eventFilter(QObject* watched, QEvent* event) {
 // ---- Default Paths page ----
 
 QTreeWidgetItem* frmSettings::selectedRomRow() const {
-    const QList<QTreeWidgetItem*> rows = vbalListDefPaths->selectedItems();
+    const QList<QTreeWidgetItem*> rows = m_ui->vbalListDefPaths->selectedItems();
     return rows.isEmpty() ? nullptr : rows.first();
 }
 
 void frmSettings::addRomRow(const QString& path, bool bEnabled) {
-    const QSignalBlocker quiet(vbalListDefPaths);
-    auto* row = new QTreeWidgetItem(vbalListDefPaths);
+    const QSignalBlocker quiet(m_ui->vbalListDefPaths);
+    auto* row = new QTreeWidgetItem(m_ui->vbalListDefPaths);
     row->setFlags(row->flags() | Qt::ItemIsUserCheckable);
     row->setText(0, path);
     row->setToolTip(0, QDir::toNativeSeparators(path));
@@ -317,9 +331,9 @@ void frmSettings::recountRomRows() {
         return;
     }
     m_bCountsPending = false;
-    const QSignalBlocker quiet(vbalListDefPaths);
-    for (int i = 0; i < vbalListDefPaths->topLevelItemCount(); ++i) {
-        QTreeWidgetItem* row = vbalListDefPaths->topLevelItem(i);
+    const QSignalBlocker quiet(m_ui->vbalListDefPaths);
+    for (int i = 0; i < m_ui->vbalListDefPaths->topLevelItemCount(); ++i) {
+        QTreeWidgetItem* row = m_ui->vbalListDefPaths->topLevelItem(i);
         FileROM.setPath(row->text(0));
         row->setText(1, QString::number(FileROM.ListCount()));
     }
@@ -334,8 +348,8 @@ void frmSettings::showEvent(QShowEvent* event) {
 
 void frmSettings::LoadDefaultPaths() {
     {
-        const QSignalBlocker quiet(vbalListDefPaths);
-        vbalListDefPaths->clear();
+        const QSignalBlocker quiet(m_ui->vbalListDefPaths);
+        m_ui->vbalListDefPaths->clear();
     }
     // The stored flags come back with the rows; a reload that cleared them would make the
     // next save disable every folder.
@@ -344,25 +358,27 @@ void frmSettings::LoadDefaultPaths() {
     // Counts every row with the page's pattern.
     txtDefPathFilter_Change();
 
-    txtDefPathz26->setText(z26PathForDisplay(m_platform.store.GetSetting(
-        kSettings, QStringLiteral("Z26Path"), m_platform.programFolder)));
+    // Until an emulator is chosen the box offers the program's folder, where it may lie.
+    const QString z26Path = read(m_platform.store, stored::z26Path);
+    m_ui->txtDefPathz26->setText(
+        z26PathForDisplay(z26Path.isEmpty() ? m_platform.programFolder : z26Path));
 }
 
 void frmSettings::SaveDefaultPaths() {
     std::vector<RomFolder> folders;
-    folders.reserve(vbalListDefPaths->topLevelItemCount());
-    for (int i = 0; i < vbalListDefPaths->topLevelItemCount(); ++i) {
-        const QTreeWidgetItem* row = vbalListDefPaths->topLevelItem(i);
+    folders.reserve(m_ui->vbalListDefPaths->topLevelItemCount());
+    for (int i = 0; i < m_ui->vbalListDefPaths->topLevelItemCount(); ++i) {
+        const QTreeWidgetItem* row = m_ui->vbalListDefPaths->topLevelItem(i);
         folders.push_back({row->text(0), row->checkState(0) == Qt::Checked});
     }
     writeRomFolders(m_platform.store, folders);
 }
 
 void frmSettings::txtDefPathFilter_Change() {
-    const QString pattern = txtDefPathFilter->text();
+    const QString pattern = m_ui->txtDefPathFilter->text();
     FileROM.setPattern(pattern);
     recountRomRows();
-    m_platform.store.SaveSetting(kSettings, QStringLiteral("ROMFilter"), pattern);
+    write(m_platform.store, stored::romFilter, pattern);
 }
 
 void frmSettings::vbalListDefPaths_ItemChanged(QTreeWidgetItem*, int column) {
@@ -391,8 +407,8 @@ void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
 void frmSettings::SetZ26Path(const QString& path) {
     const QString executable = completeZ26Path(path);
     if (QFileInfo(executable).isFile()) {
-        txtDefPathz26->setText(executable);
-        m_platform.store.SaveSetting(kSettings, QStringLiteral("z26Path"), executable);
+        m_ui->txtDefPathz26->setText(executable);
+        write(m_platform.store, stored::z26Path, executable);
         return;
     }
     m_platform.dialogs.MsgBox(
@@ -425,7 +441,7 @@ void frmSettings::mnuROMSRemove_Click() {
     QTreeWidgetItem* row = selectedRomRow();
     if (row == nullptr)
         return;
-    const int index = vbalListDefPaths->indexOfTopLevelItem(row);
+    const int index = m_ui->vbalListDefPaths->indexOfTopLevelItem(row);
     const QString path = row->text(0);
     const MsgResult answer = m_platform.dialogs.MsgBox(
         this,
@@ -435,11 +451,11 @@ void frmSettings::mnuROMSRemove_Click() {
     if (answer != MsgResult::Yes)
         return;
     // The question let other events run; remove the row only if it is still the one asked about.
-    QTreeWidgetItem* asked = vbalListDefPaths->topLevelItem(index);
+    QTreeWidgetItem* asked = m_ui->vbalListDefPaths->topLevelItem(index);
     if (asked == nullptr || asked->text(0) != path)
         return;
     {
-        const QSignalBlocker quiet(vbalListDefPaths);
+        const QSignalBlocker quiet(m_ui->vbalListDefPaths);
         delete asked;
     }
     SaveDefaultPaths();
@@ -473,8 +489,8 @@ void frmSettings::vbalListDefPaths_MouseDown(Qt::MouseButton button, const QPoin
     if (button != Qt::RightButton)
         return;
     const QTreeWidgetItem* row = selectedRomRow();
-    mnuROMSRemove->setVisible(row != nullptr && !row->text(0).isEmpty());
-    mnuROMSPopup->popup(vbalListDefPaths->viewport()->mapToGlobal(pos));
+    m_ui->mnuROMSRemove->setVisible(row != nullptr && !row->text(0).isEmpty());
+    m_ui->mnuROMSPopup->popup(m_ui->vbalListDefPaths->viewport()->mapToGlobal(pos));
 }
 
 void frmSettings::vbalListDefPaths_OLEDragDrop(const QMimeData* data) {

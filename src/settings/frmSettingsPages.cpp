@@ -1,11 +1,14 @@
-// The settings window's pages: their controls, captions, grouping and initial states.
-// What the option controls do is wired elsewhere; the Default Paths page's behaviour is in
-// frmSettings.cpp.
+// The settings window's pages: their controls, captions and grouping. What the option
+// controls show and do comes from the options (frmSettingsOptions.cpp); the Default Paths
+// page's behaviour is in frmSettings.cpp.
 
-#include "settings/frmSettings.h"
+#include "settings/frmSettingsUi.h"
 
-#include "settings/OptionLists.h"
+#include "emulator/EmulatorOptions.h"
+#include "settings/SliderRules.h"
+#include "ui/PictureBox.h"
 #include "ui/Twips.h"
+#include "ui/vbalProgressBar.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
@@ -46,8 +49,8 @@ QLabel* label(const char* name, const char* caption) {
 }
 
 // The numeric option fields are short: a few digits.
-QLineEdit* numberField(const char* name, const char* text) {
-    auto* field = named(new QLineEdit(QString::fromUtf8(text)), name);
+QLineEdit* numberField(const char* name) {
+    auto* field = named(new QLineEdit, name);
     field->setFixedWidth(twips::toPixelsX(750));
     return field;
 }
@@ -83,40 +86,44 @@ QHBoxLayout* row(std::initializer_list<QWidget*> widgets, bool bStretch = true) 
     return layout;
 }
 
+QComboBox* list(const char* name, const auto& entries) {
+    auto* combo = named(new QComboBox, name);
+    for (const char* entry : entries)
+        combo->addItem(QString::fromUtf8(entry));
+    return combo;
+}
+
 } // namespace
 
 void frmSettings::createSettingsPage() {
-    auto* page = pageLayout(picSettings);
+    auto* page = pageLayout(m_ui->pages[0]);
 
-    fraConfig = frame("fraConfig", "Save/Load settings");
-    cmdSaveDat = named(new QPushButton(QStringLiteral("&Save")), "cmdSaveDat");
-    cmdLoadDat = named(new QPushButton(QStringLiteral("&Load")), "cmdLoadDat");
-    lblConfig = named(new QLabel, "lblConfig");
-    lblConfig->setWordWrap(true);
+    auto* fraConfig = frame("fraConfig", "Save/Load settings");
+    auto* cmdSaveDat = named(new QPushButton(QStringLiteral("&Save")), "cmdSaveDat");
+    auto* cmdLoadDat = named(new QPushButton(QStringLiteral("&Load")), "cmdLoadDat");
+    connect(cmdSaveDat, &QPushButton::clicked, this, &frmSettings::cmdSaveDat_Click);
+    connect(cmdLoadDat, &QPushButton::clicked, this, &frmSettings::cmdLoadDat_Click);
+    m_ui->lblConfig = named(new QLabel, "lblConfig");
+    m_ui->lblConfig->setWordWrap(true);
     auto* config = tight(new QHBoxLayout(fraConfig), 8);
     config->addWidget(cmdSaveDat);
     config->addWidget(cmdLoadDat);
-    config->addWidget(lblConfig, 1);
+    config->addWidget(m_ui->lblConfig, 1);
     page->addWidget(fraConfig);
 
-    fraVideoMode = frame("fraVideoMode", "Start game in Video Mode...");
-    comboVideoMode = named(new QComboBox, "comboVideoMode");
-    optVMWindow = option("optVMWindow", "Window");
-    optVMFull = option("optVMFull", "Fullscreen");
-    optVMDefault = option("optVMDefault", "Default");
-    optVMDefault->setChecked(true);
-    txtVidModeBalloon = balloonAnchor("txtVidModeBalloon", fraVideoMode);
+    auto* fraVideoMode = frame("fraVideoMode", "Start game in Video Mode...");
+    m_ui->comboVideoMode = list("comboVideoMode", kVideoModeEntries);
+    m_ui->txtVidModeBalloon = balloonAnchor("txtVidModeBalloon", fraVideoMode);
     auto* video = tight(new QVBoxLayout(fraVideoMode));
-    video->addWidget(comboVideoMode);
-    video->addLayout(row({optVMWindow, optVMFull, optVMDefault}));
+    video->addWidget(m_ui->comboVideoMode);
+    video->addLayout(row({option("optVMWindow", "Window"), option("optVMFull", "Fullscreen"),
+                          option("optVMDefault", "Default")}));
 
-    fraScreenCapture = frame("fraScreenCapture", "Screen Capture to...");
-    optSCPCX = option("optSCPCX", "PCX file");
-    optSCBMP = option("optSCBMP", "BMP file");
+    auto* fraScreenCapture = frame("fraScreenCapture", "Screen Capture to...");
+    auto* optSCBMP = option("optSCBMP", "BMP file");
     optSCBMP->setToolTip(QStringLiteral("Works with phosphorescent games."));
-    optSCPCX->setChecked(true);
     auto* capture = tight(new QVBoxLayout(fraScreenCapture), 0);
-    capture->addWidget(optSCPCX);
+    capture->addWidget(option("optSCPCX", "PCX file"));
     capture->addWidget(optSCBMP);
     capture->addStretch(1);
 
@@ -125,24 +132,17 @@ void frmSettings::createSettingsPage() {
     middle->addWidget(fraScreenCapture);
     page->addLayout(middle);
 
-    fraDSP = frame("fraDSP", "DSP processing level");
-    optDSPLow = option("optDSPLow", "Low");
-    optDSPHigh = option("optDSPHigh", "High");
-    optDSPDefault = option("optDSPDefault", "Default");
-    optDSPDefault->setChecked(true);
+    auto* fraDSP = frame("fraDSP", "DSP processing level");
     auto* dsp = tight(new QVBoxLayout(fraDSP), 0);
-    dsp->addWidget(optDSPLow);
-    dsp->addWidget(optDSPHigh);
-    dsp->addWidget(optDSPDefault);
+    dsp->addWidget(option("optDSPLow", "Low"));
+    dsp->addWidget(option("optDSPHigh", "High"));
+    dsp->addWidget(option("optDSPDefault", "Default"));
 
-    fraStart = frame("fraStart", "Start game with...");
-    chkP0Hard = check("chkP0Hard", "Player 0 hard");
-    chkP1Hard = check("chkP1Hard", "Player 1 hard");
-    chkBW = check("chkBW", "Black and white");
+    auto* fraStart = frame("fraStart", "Start game with...");
     auto* start = tight(new QVBoxLayout(fraStart), 0);
-    start->addWidget(chkP0Hard);
-    start->addWidget(chkP1Hard);
-    start->addWidget(chkBW);
+    start->addWidget(check("chkP0Hard", "Player 0 hard"));
+    start->addWidget(check("chkP1Hard", "Player 1 hard"));
+    start->addWidget(check("chkBW", "Black and white"));
 
     auto* bottom = new QHBoxLayout;
     bottom->addWidget(fraDSP, 1);
@@ -152,346 +152,258 @@ void frmSettings::createSettingsPage() {
 }
 
 void frmSettings::createControlsPage() {
-    auto* page = pageLayout(picControls);
+    auto* page = pageLayout(m_ui->pages[1]);
 
-    fraLeftController = frame("fraLeftController", "Select Controller On Left Port");
-    comboLeftController = named(new QComboBox, "comboLeftController");
-    tight(new QVBoxLayout(fraLeftController))->addWidget(comboLeftController);
-    fraRightController = frame("fraRightController", "Select Controller On Right Port");
-    comboRightController = named(new QComboBox, "comboRightController");
-    tight(new QVBoxLayout(fraRightController))->addWidget(comboRightController);
-    // Until the controller lists set them, the buttons name the layout of "AutoDetect".
-    cmdLeftControlPic =
-        named(new QPushButton(QStringLiteral("Standard Control Layout")), "cmdLeftControlPic");
-    cmdRightControlPic =
-        named(new QPushButton(QStringLiteral("Standard Control Layout")), "cmdRightControlPic");
+    auto* fraLeftController = frame("fraLeftController", "Select Controller On Left Port");
+    tight(new QVBoxLayout(fraLeftController))
+        ->addWidget(list("comboLeftController", kControllerEntries));
+    auto* fraRightController = frame("fraRightController", "Select Controller On Right Port");
+    tight(new QVBoxLayout(fraRightController))
+        ->addWidget(list("comboRightController", kControllerEntries));
+    m_ui->cmdLeftControlPic = named(new QPushButton, "cmdLeftControlPic");
+    m_ui->cmdRightControlPic = named(new QPushButton, "cmdRightControlPic");
+    connect(m_ui->cmdLeftControlPic, &QPushButton::clicked, this, [this] { showControlPic(true); });
+    connect(m_ui->cmdRightControlPic, &QPushButton::clicked, this,
+            [this] { showControlPic(false); });
 
     auto* ports = new QGridLayout;
     ports->setVerticalSpacing(2);
     ports->addWidget(fraLeftController, 0, 0);
     ports->addWidget(fraRightController, 0, 1);
-    ports->addWidget(cmdLeftControlPic, 1, 0);
-    ports->addWidget(cmdRightControlPic, 1, 1);
+    ports->addWidget(m_ui->cmdLeftControlPic, 1, 0);
+    ports->addWidget(m_ui->cmdRightControlPic, 1, 1);
     page->addLayout(ports);
 
-    fraInactiveControll = frame("fraInactiveControll", "Inactivate PC-controller");
-    chkIPCStella = check("chkIPCStella", "Stelladaptor");
-    chkIPCJoystick = check("chkIPCJoystick", "Joystick");
-    chkIPCMouse = check("chkIPCMouse", "Mouse");
-    chkIPCKeyboard = check("chkIPCKeyboard", "Keyboard");
-    txtIPC4Balloon = balloonAnchor("txtIPC4Balloon", fraInactiveControll);
-    tight(new QVBoxLayout(fraInactiveControll))
-        ->addLayout(row({chkIPCStella, chkIPCJoystick, chkIPCMouse, chkIPCKeyboard}));
+    auto* fraInactiveControll = frame("fraInactiveControll", "Inactivate PC-controller");
+    auto& ipc = m_ui->ipc;
+    ipc = {check("chkIPCKeyboard", "Keyboard"), check("chkIPCMouse", "Mouse"),
+           check("chkIPCJoystick", "Joystick"), check("chkIPCStella", "Stelladaptor")};
+    m_ui->txtIPC4Balloon = balloonAnchor("txtIPC4Balloon", fraInactiveControll);
+    tight(new QVBoxLayout(fraInactiveControll))->addLayout(row({ipc[3], ipc[2], ipc[1], ipc[0]}));
     page->addWidget(fraInactiveControll);
 
-    fraPaddleSens = frame("fraPaddleSens", "Keyboard Paddle Sensitivity");
-    BarColorPaddle = createBarColorPaddle();
-    tight(new QVBoxLayout(fraPaddleSens))->addWidget(BarColorPaddle);
+    m_ui->fraPaddleSens = frame("fraPaddleSens", "Keyboard Paddle Sensitivity");
+    m_ui->BarColorPaddle =
+        createSliderBar("BarColorPaddle", sliders::kPaddleMin, sliders::kPaddleMax);
+    tight(new QVBoxLayout(m_ui->fraPaddleSens))->addWidget(m_ui->BarColorPaddle);
 
     // Shown only while a port holds a light gun.
-    fraLightgun = frame("fraLightgun", "LightGun");
-    lblLightGunAdjust = label("lblLightGunAdjust", "Adjust by...");
-    txtLightGunCycles = numberField("txtLightGunCycles", "0");
-    lblLightGunCycles = label("lblLightGunCycles", "Cycles");
-    txtLightGunScan = numberField("txtLightGunScan", "0");
-    lblLightGunScan = label("lblLightGunScan", "Scanlines");
-    auto* lightgun = tight(new QHBoxLayout(fraLightgun));
-    for (QWidget* widget :
-         {static_cast<QWidget*>(lblLightGunAdjust), static_cast<QWidget*>(txtLightGunCycles),
-          static_cast<QWidget*>(lblLightGunCycles), static_cast<QWidget*>(txtLightGunScan),
-          static_cast<QWidget*>(lblLightGunScan)})
+    m_ui->fraLightgun = frame("fraLightgun", "LightGun");
+    m_ui->txtLightGunCycles = numberField("txtLightGunCycles");
+    m_ui->txtLightGunScan = numberField("txtLightGunScan");
+    auto* lightgun = tight(new QHBoxLayout(m_ui->fraLightgun));
+    for (QWidget* widget : std::initializer_list<QWidget*>{
+             label("lblLightGunAdjust", "Adjust by..."), m_ui->txtLightGunCycles,
+             label("lblLightGunCycles", "Cycles"), m_ui->txtLightGunScan,
+             label("lblLightGunScan", "Scanlines")})
         lightgun->addWidget(widget);
     lightgun->addStretch(1);
-    fraLightgun->setEnabled(false);
-    fraLightgun->hide();
 
     auto* middle = new QHBoxLayout;
-    middle->addWidget(fraPaddleSens, 1);
-    middle->addWidget(fraLightgun, 1);
+    middle->addWidget(m_ui->fraPaddleSens, 1);
+    middle->addWidget(m_ui->fraLightgun, 1);
     page->addLayout(middle);
 
-    chkSwapControl = check("chkSwapControl", "Swap Atari Controller Ports");
+    auto* chkSwapControl = check("chkSwapControl", "Swap Atari Controller Ports");
     chkSwapControl->setToolTip(QStringLiteral("For All Controller Types"));
     page->addWidget(chkSwapControl);
     page->addStretch(1);
 }
 
 void frmSettings::createPaddlesAudioPage() {
-    auto* page = pageLayout(picPaddlesAudio);
+    auto* page = pageLayout(m_ui->pages[2]);
 
-    fraLowerSens = frame("fraLowerSens", "Lower Sesitivity");
-    lblLowerSens = label("lblLowerSens", "Lower sesitivity for PC Joysticks / Stelladaptor in "
-                                         "Paddle Emulation, and delay the paddle read-bit "
-                                         "flipping by...");
+    auto* fraLowerSens = frame("fraLowerSens", "Lower Sesitivity");
+    auto* lblLowerSens = label("lblLowerSens", "Lower sesitivity for PC Joysticks / Stelladaptor "
+                                               "in Paddle Emulation, and delay the paddle "
+                                               "read-bit flipping by...");
     lblLowerSens->setWordWrap(true);
-    chkLowerSens = check("chkLowerSens", "Enable");
-    txtLowerSens = numberField("txtLowerSens", "1");
-    txtLowerSens->setEnabled(false);
-    lblLowerSensScan = label("lblLowerSensScan", "Scanlines");
+    m_ui->chkLowerSens = check("chkLowerSens", "Enable");
+    m_ui->txtLowerSens = numberField("txtLowerSens");
     auto* lower = tight(new QVBoxLayout(fraLowerSens), 2);
     lower->addWidget(lblLowerSens);
-    lower->addLayout(row({chkLowerSens, txtLowerSens, lblLowerSensScan}));
+    lower->addLayout(
+        row({m_ui->chkLowerSens, m_ui->txtLowerSens, label("lblLowerSensScan", "Scanlines")}));
     page->addWidget(fraLowerSens);
 
-    fraSoundQueue = frame("fraSoundQueue", "Size of Sound Queue");
-    BarColorSoundQueue = createBarColorSoundQueue();
-    tight(new QVBoxLayout(fraSoundQueue))->addWidget(BarColorSoundQueue);
+    auto* fraSoundQueue = frame("fraSoundQueue", "Size of Sound Queue");
+    const sliders::Scale start = sliders::SoundQueueDefault();
+    m_ui->BarColorSoundQueue = createSliderBar("BarColorSoundQueue", start.min, start.max);
+    m_ui->BarColorSoundQueue->setToolTip(
+        QStringLiteral("Double click to reset value to the default"));
+    tight(new QVBoxLayout(fraSoundQueue))->addWidget(m_ui->BarColorSoundQueue);
     page->addWidget(fraSoundQueue);
 
     // Two groups in one frame: the first mouse's paddle and the second's.
-    fraPaddleMouse = frame("fraPaddleMouse", "Paddles to Emulate with Mouse");
+    auto* fraPaddleMouse = frame("fraPaddleMouse", "Paddles to Emulate with Mouse");
     auto* paddles = tight(new QGridLayout(fraPaddleMouse), 0);
     paddles->setHorizontalSpacing(8);
-    const auto makeGroup = [&](std::array<QRadioButton*, 4>& buttons, QRadioButton*& none,
-                               const char* prefix, int gridRow) {
+    const auto makeGroup = [&](const char* prefix, int gridRow) {
         auto* group = new QButtonGroup(this);
-        for (int i = 0; i < 4; ++i) {
-            const QByteArray name = QByteArray(prefix) + '_' + QByteArray::number(i);
-            buttons[i] = option(name.constData(), ("Paddle " + QByteArray::number(i)).constData());
-            group->addButton(buttons[i], i);
-            paddles->addWidget(buttons[i], gridRow, i);
+        for (int i = 0; i <= 4; ++i) {
+            const QByteArray name =
+                i < 4 ? prefix + ('_' + QByteArray::number(i)) : QByteArray(prefix) + "None";
+            const QByteArray caption = i < 4 ? "Paddle " + QByteArray::number(i) : "None";
+            QRadioButton* button = option(name.constData(), caption.constData());
+            group->addButton(button, i);
+            paddles->addWidget(button, gridRow, i);
         }
-        none = option((QByteArray(prefix) + "None").constData(), "None");
-        group->addButton(none, 4);
-        paddles->addWidget(none, gridRow, 4);
-        none->setChecked(true);
-        return group;
     };
-    m_groupPaddleM1 = makeGroup(optPaddleM1, optPaddleM1None, "optPaddleM1", 0);
-    m_groupPaddleM2 = makeGroup(optPaddleM2, optPaddleM2None, "optPaddleM2", 1);
+    makeGroup("optPaddleM1", 0);
+    makeGroup("optPaddleM2", 1);
     paddles->setColumnStretch(5, 1);
     page->addWidget(fraPaddleMouse);
 
-    chkQuiet = check("chkQuiet", "Quiet... Disable Sound");
-    page->addWidget(chkQuiet);
+    page->addWidget(check("chkQuiet", "Quiet... Disable Sound"));
     page->addStretch(1);
 }
 
 void frmSettings::createVideoPage() {
-    auto* page = pageLayout(picVideo);
+    auto* page = pageLayout(m_ui->pages[3]);
 
-    fraScanLines = frame("fraScanLines", "Scanlines");
-    chkScanLines = check("chkScanLines", "Enabled");
-    txtScanLines = numberField("txtScanLines", "0");
-    txtScanLines->setEnabled(false);
-    lblScanLines = label("lblScanLines", "Set the maximum number of scanlines to render (Height)");
+    auto* fraScanLines = frame("fraScanLines", "Scanlines");
+    m_ui->chkScanLines = check("chkScanLines", "Enabled");
+    m_ui->txtScanLines = numberField("txtScanLines");
+    auto* lblScanLines =
+        label("lblScanLines", "Set the maximum number of scanlines to render (Height)");
     lblScanLines->setWordWrap(true);
     auto* scan = tight(new QHBoxLayout(fraScanLines), 8);
-    scan->addWidget(chkScanLines);
-    scan->addWidget(txtScanLines);
+    scan->addWidget(m_ui->chkScanLines);
+    scan->addWidget(m_ui->txtScanLines);
     scan->addWidget(lblScanLines, 1);
     page->addWidget(fraScanLines);
 
-    fraFrameRate = frame("fraFrameRate", "Frame Rate");
-    optFPScustom = option("optFPScustom", "Custom FPS");
-    txtFPScustom = numberField("txtFPScustom", "");
-    txtFPScustom->setEnabled(false);
-    optFPSmonitor = option("optFPSmonitor", "Monitor Speed");
-    optFPSDefault = option("optFPSDefault", "Default");
-    optFPSDefault->setChecked(true);
+    auto* fraFrameRate = frame("fraFrameRate", "Frame Rate");
+    m_ui->optFPScustom = option("optFPScustom", "Custom FPS");
+    m_ui->txtFPScustom = numberField("txtFPScustom");
+    m_ui->optFPSmonitor = option("optFPSmonitor", "Monitor Speed");
     tight(new QVBoxLayout(fraFrameRate))
-        ->addLayout(row({optFPScustom, txtFPScustom, optFPSmonitor, optFPSDefault}));
+        ->addLayout(row({m_ui->optFPScustom, m_ui->txtFPScustom, m_ui->optFPSmonitor,
+                         option("optFPSDefault", "Default")}));
 
-    fraNarrow = frame("fraNarrow", "Narrow Video Modes");
-    optNarrowNot = option("optNarrowNot", "Not Enabled");
-    optNarrow1 = option("optNarrow1", "Mode 1");
-    optNarrow2 = option("optNarrow2", "Mode 2");
-    optNarrowNot->setChecked(true);
-    tight(new QVBoxLayout(fraNarrow))->addLayout(row({optNarrowNot, optNarrow1, optNarrow2}));
+    auto* fraNarrow = frame("fraNarrow", "Narrow Video Modes");
+    tight(new QVBoxLayout(fraNarrow))
+        ->addLayout(row({option("optNarrowNot", "Not Enabled"), option("optNarrow1", "Mode 1"),
+                         option("optNarrow2", "Mode 2")}));
 
     auto* rateNarrow = new QHBoxLayout;
     rateNarrow->addWidget(fraFrameRate, 1);
     rateNarrow->addWidget(fraNarrow);
     page->addLayout(rateNarrow);
 
-    fraColorPalette = frame("fraColorPalette", "Color Palette");
-    optCPNTSC = option("optCPNTSC", "NTSC");
-    optCPPAL = option("optCPPAL", "PAL");
-    optCPSECAM = option("optCPSECAM", "SECAM");
-    optCPDefault = option("optCPDefault", "Default");
-    optCPDefault->setChecked(true);
+    auto* fraColorPalette = frame("fraColorPalette", "Color Palette");
     tight(new QVBoxLayout(fraColorPalette))
-        ->addLayout(row({optCPNTSC, optCPPAL, optCPSECAM, optCPDefault}));
+        ->addLayout(row({option("optCPNTSC", "NTSC"), option("optCPPAL", "PAL"),
+                         option("optCPSECAM", "SECAM"), option("optCPDefault", "Default")}));
 
-    fraPhos = frame("fraPhos", "Phosphorescent Effect");
-    BarColorPhos = createBarColorPhos();
-    tight(new QVBoxLayout(fraPhos))->addWidget(BarColorPhos);
+    auto* fraPhos = frame("fraPhos", "Phosphorescent Effect");
+    m_ui->BarColorPhos = createSliderBar("BarColorPhos", sliders::kPhosMin, sliders::kPhosMax);
+    tight(new QVBoxLayout(fraPhos))->addWidget(m_ui->BarColorPhos);
 
     auto* palettePhos = new QHBoxLayout;
     palettePhos->addWidget(fraColorPalette);
     palettePhos->addWidget(fraPhos, 1);
     page->addLayout(palettePhos);
 
-    chkPALColorLoss = check("chkPALColorLoss", "Simulate PAL color loss");
-    chkSyncWSound = check("chkSyncWSound", "Synchronize with sound instead of display");
-    chkInterlaced = check("chkInterlaced", "Run interlaced games");
     auto* boxes = new QGridLayout;
     boxes->setVerticalSpacing(0);
-    boxes->addWidget(chkPALColorLoss, 0, 0);
-    boxes->addWidget(chkSyncWSound, 0, 1);
-    boxes->addWidget(chkInterlaced, 1, 0);
+    boxes->addWidget(check("chkPALColorLoss", "Simulate PAL color loss"), 0, 0);
+    boxes->addWidget(check("chkSyncWSound", "Synchronize with sound instead of display"), 0, 1);
+    boxes->addWidget(check("chkInterlaced", "Run interlaced games"), 1, 0);
     boxes->setColumnStretch(1, 1);
     page->addLayout(boxes);
     page->addStretch(1);
 }
 
 void frmSettings::createDebugPage() {
-    auto* page = pageLayout(picDebug);
+    auto* page = pageLayout(m_ui->pages[4]);
     page->setSpacing(2);
 
-    fraLineScan = frame("fraLineScan", "Start Scanning Game at Line...");
-    chkLineScan = check("chkLineScan", "Enabled");
-    txtLineScan = numberField("txtLineScan", "0");
-    txtLineScan->setEnabled(false);
-    tight(new QVBoxLayout(fraLineScan))->addLayout(row({chkLineScan, txtLineScan}));
+    auto* fraLineScan = frame("fraLineScan", "Start Scanning Game at Line...");
+    m_ui->chkLineScan = check("chkLineScan", "Enabled");
+    m_ui->txtLineScan = numberField("txtLineScan");
+    tight(new QVBoxLayout(fraLineScan))->addLayout(row({m_ui->chkLineScan, m_ui->txtLineScan}));
 
-    fraGameType = frame("fraGameType", "Override Game Type");
-    comboGT = named(new QComboBox, "comboGT");
-    tight(new QVBoxLayout(fraGameType))->addWidget(comboGT);
+    auto* fraGameType = frame("fraGameType", "Override Game Type");
+    tight(new QVBoxLayout(fraGameType))->addWidget(list("comboGT", kGameTypeEntries));
 
     auto* top = new QHBoxLayout;
     top->addWidget(fraLineScan);
     top->addWidget(fraGameType, 1);
     page->addLayout(top);
 
-    chkMouseCapture = check("chkMouseCapture", "Enable mouse capture in a window");
-    chkMouseCapture->setChecked(true);
-    chkAllow4 =
-        check("chkAllow4", "Allow all 4 directions on the joystick to be pressed simultaneously");
-    chkFastCopy = check("chkFastCopy", "Disable the fast copy routines");
-    chkPrintChecksum = check("chkPrintChecksum", "Print checksum of cartridge");
-    chkCodeTrace = check("chkCodeTrace", "Write code trace to z26.log");
-    chkShowScanline = check("chkShowScanline", "Show scanline count and FPS on game display");
     for (QCheckBox* box :
-         {chkMouseCapture, chkAllow4, chkFastCopy, chkPrintChecksum, chkCodeTrace, chkShowScanline})
+         {check("chkMouseCapture", "Enable mouse capture in a window"),
+          check("chkAllow4", "Allow all 4 directions on the joystick to be pressed simultaneously"),
+          check("chkFastCopy", "Disable the fast copy routines"),
+          check("chkPrintChecksum", "Print checksum of cartridge"),
+          check("chkCodeTrace", "Write code trace to z26.log"),
+          check("chkShowScanline", "Show scanline count and FPS on game display")})
         page->addWidget(box);
 
-    fraDOSOutput = frame("fraDOSOutput", "DOS Command Switches Outputed");
-    chkDOSSwitch = check("chkDOSSwitch", "Edit Switches");
-    lblDOSSwitchInstruction = label("lblDOSSwitchInstruction", "Press Enter to Execute Game");
-    lblDOSSwitchInstruction->hide();
-    lblDOSOutput = named(new QLabel, "lblDOSOutput");
-    lblDOSOutput->setTextInteractionFlags(Qt::TextSelectableByMouse);
-    lblDOSOutput->setMinimumHeight(twips::toPixelsY(315));
-    txtDOSOutput = named(new QLineEdit, "txtDOSOutput");
-    txtDOSOutput->hide();
+    auto* fraDOSOutput = frame("fraDOSOutput", "DOS Command Switches Outputed");
+    m_ui->chkDOSSwitch = check("chkDOSSwitch", "Edit Switches");
+    m_ui->lblDOSSwitchInstruction = label("lblDOSSwitchInstruction", "Press Enter to Execute Game");
+    m_ui->lblDOSSwitchInstruction->hide();
+    m_ui->lblDOSOutput = named(new QLabel, "lblDOSOutput");
+    // The preview shows switches, never markup, whatever was pasted into a field.
+    m_ui->lblDOSOutput->setTextFormat(Qt::PlainText);
+    m_ui->lblDOSOutput->setTextInteractionFlags(Qt::TextSelectableByMouse);
+    m_ui->lblDOSOutput->setMinimumHeight(twips::toPixelsY(315));
+    m_ui->txtDOSOutput = named(new QLineEdit, "txtDOSOutput");
+    m_ui->txtDOSOutput->hide();
     auto* dos = tight(new QGridLayout(fraDOSOutput), 2);
     dos->setHorizontalSpacing(8);
-    dos->addWidget(chkDOSSwitch, 0, 0);
+    dos->addWidget(m_ui->chkDOSSwitch, 0, 0);
     // The preview label and the edit box take turns in the same place, so the frame
     // keeps its height in both modes.
-    dos->addWidget(lblDOSOutput, 0, 1);
-    dos->addWidget(txtDOSOutput, 0, 1);
-    dos->addWidget(lblDOSSwitchInstruction, 0, 2);
+    dos->addWidget(m_ui->lblDOSOutput, 0, 1);
+    dos->addWidget(m_ui->txtDOSOutput, 0, 1);
+    dos->addWidget(m_ui->lblDOSSwitchInstruction, 0, 2);
     dos->setColumnStretch(1, 1);
     page->addWidget(fraDOSOutput);
     page->addStretch(1);
 }
 
 void frmSettings::createDefaultPathsPage() {
-    auto* page = pageLayout(picDefPaths);
+    auto* page = pageLayout(m_ui->pages[5]);
 
-    fraDefPathFilter = frame("fraDefPathFilter", "ROM Filter");
-    txtDefPathFilter = named(new QLineEdit, "txtDefPathFilter");
-    tight(new QVBoxLayout(fraDefPathFilter))->addWidget(txtDefPathFilter);
+    auto* fraDefPathFilter = frame("fraDefPathFilter", "ROM Filter");
+    m_ui->txtDefPathFilter = named(new QLineEdit, "txtDefPathFilter");
+    tight(new QVBoxLayout(fraDefPathFilter))->addWidget(m_ui->txtDefPathFilter);
     page->addWidget(fraDefPathFilter);
 
-    fraDefPathz26 = frame("fraDefPathz26", "Drag && Drop z26 Path Here...");
-    txtDefPathz26 = named(new QLineEdit, "txtDefPathz26");
+    auto* fraDefPathz26 = frame("fraDefPathz26", "Drag && Drop z26 Path Here...");
+    m_ui->txtDefPathz26 = named(new QLineEdit, "txtDefPathz26");
     // Changed only through the chooser or a drop, which check the path first.
-    txtDefPathz26->setReadOnly(true);
-    txtDefPathz26->setAcceptDrops(true);
-    cmdAddZ26Path = named(new QPushButton(QStringLiteral("...")), "cmdAddZ26Path");
+    m_ui->txtDefPathz26->setReadOnly(true);
+    m_ui->txtDefPathz26->setAcceptDrops(true);
+    auto* cmdAddZ26Path = named(new QPushButton(QStringLiteral("...")), "cmdAddZ26Path");
     cmdAddZ26Path->setFixedWidth(twips::toPixelsX(495));
+    connect(cmdAddZ26Path, &QPushButton::clicked, this, &frmSettings::cmdAddZ26Path_Click);
     auto* z26 = tight(new QHBoxLayout(fraDefPathz26));
-    z26->addWidget(txtDefPathz26, 1);
+    z26->addWidget(m_ui->txtDefPathz26, 1);
     z26->addWidget(cmdAddZ26Path);
     page->addWidget(fraDefPathz26);
 
-    fraDefPathRom = frame("fraDefPathRom", "Drag && Drop ROM's Paths Here...");
-    vbalListDefPaths = named(new QTreeWidget, "vbalListDefPaths");
-    vbalListDefPaths->setRootIsDecorated(false);
-    vbalListDefPaths->setUniformRowHeights(true);
-    vbalListDefPaths->setAllColumnsShowFocus(true);
-    vbalListDefPaths->setSelectionMode(QAbstractItemView::SingleSelection);
-    vbalListDefPaths->setContextMenuPolicy(Qt::CustomContextMenu);
-    vbalListDefPaths->setAcceptDrops(true);
-    vbalListDefPaths->viewport()->setAcceptDrops(true);
-    tight(new QVBoxLayout(fraDefPathRom))->addWidget(vbalListDefPaths);
+    auto* fraDefPathRom = frame("fraDefPathRom", "Drag && Drop ROM's Paths Here...");
+    QTreeWidget* paths = m_ui->vbalListDefPaths = named(new QTreeWidget, "vbalListDefPaths");
+    paths->setRootIsDecorated(false);
+    paths->setUniformRowHeights(true);
+    paths->setAllColumnsShowFocus(true);
+    paths->setSelectionMode(QAbstractItemView::SingleSelection);
+    paths->setContextMenuPolicy(Qt::CustomContextMenu);
+    paths->setAcceptDrops(true);
+    paths->viewport()->setAcceptDrops(true);
+    tight(new QVBoxLayout(fraDefPathRom))->addWidget(paths);
     page->addWidget(fraDefPathRom, 1);
 
-    mnuROMSPopup = named(new QMenu(QStringLiteral("ROMSPopup"), this), "mnuROMSPopup");
-    mnuROMSRemove = named(mnuROMSPopup->addAction(QStringLiteral("Remove")), "mnuROMSRemove");
-    mnuROMSRefresh = named(mnuROMSPopup->addAction(QStringLiteral("Refresh")), "mnuROMSRefresh");
-    mnuROMSAdd = named(mnuROMSPopup->addAction(QStringLiteral("Add Path")), "mnuROMSAdd");
-}
-
-void frmSettings::createGraveyard() {
-    // Retired controls. Loading a configuration file still sets some of them, and switch
-    // builders nobody calls read them; the user never sees them.
-    picGraveyard = named(new QWidget(this), "picGraveyard");
-    picGraveyard->hide();
-    auto* layout = new QVBoxLayout(picGraveyard);
-
-    cmdStandard = named(new QPushButton(QStringLiteral("Joystick Controlls")), "cmdStandard");
-    cmdDriving = named(new QPushButton(QStringLiteral("Driving Controls")), "cmdDriving");
-    cmdKeyboard = named(new QPushButton(QStringLiteral("Keyboard Controlls")), "cmdKeyboard");
-    cmdMindlink = named(new QPushButton(QStringLiteral("See Pic")), "cmdMindlink");
-    for (QPushButton* button : {cmdStandard, cmdDriving, cmdKeyboard, cmdMindlink})
-        layout->addWidget(button);
-
-    const auto pair = [&](QGroupBox*& box, const char* name, const char* title, QCheckBox*& left,
-                          const char* leftName, QCheckBox*& right, const char* rightName) {
-        box = frame(name, title);
-        left = check(leftName, "Left");
-        right = check(rightName, "Right");
-        auto* inner = new QHBoxLayout(box);
-        inner->addWidget(left);
-        inner->addWidget(right);
-        layout->addWidget(box);
-    };
-    pair(fraKeyCont, "fraKeyCont", "Emulate Keyboard Controler", chkKeyLeft, "chkKeyLeft",
-         chkKeyRight, "chkKeyRight");
-    pair(fraDriveCont, "fraDriveCont", "Emulate Driving Controler", chkDriveLeft, "chkDriveLeft",
-         chkDriveRight, "chkDriveRight");
-    pair(fraMindlink, "fraMindlink", "Enable Mindlink Controller", chkMindlinkLeft,
-         "chkMindlinkLeft", chkMindlinkRight, "chkMindlinkRight");
-
-    fraPaddleKey = frame("fraPaddleKey", "Paddle to Emulate with Keyboard");
-    auto* paddleKey = new QHBoxLayout(fraPaddleKey);
-    for (int i = 0; i < 4; ++i) {
-        const QByteArray name = QByteArrayLiteral("optPaddleKey_") + QByteArray::number(i);
-        optPaddleKey[i] = option(name.constData(), ("Paddle " + QByteArray::number(i)).constData());
-        paddleKey->addWidget(optPaddleKey[i]);
-    }
-    optPaddleKeyNone = option("optPaddleKeyNone", "None");
-    optPaddleKeyNone->setChecked(true);
-    paddleKey->addWidget(optPaddleKeyNone);
-    layout->addWidget(fraPaddleKey);
-
-    fraJoyOptions = frame("fraJoyOptions", "Joystick Options");
-    optJoyDefault = option("optJoyDefault", "Default");
-    optJoyKey = option("optJoyKey", "Keyboard Only");
-    optJoyRev = option("optJoyRev", "Reverse Keyboard");
-    optJoyDefault->setChecked(true);
-    auto* joy = new QHBoxLayout(fraJoyOptions);
-    joy->addWidget(optJoyDefault);
-    joy->addWidget(optJoyKey);
-    joy->addWidget(optJoyRev);
-    layout->addWidget(fraJoyOptions);
-
-    chkLightGun = check("chkLightGun", "Emulate Light Gun");
-    layout->addWidget(chkLightGun);
-}
-
-void frmSettings::fillComboLists() {
-    const auto fill = [](QComboBox* combo, const auto& entries) {
-        for (const char* entry : entries)
-            combo->addItem(QString::fromUtf8(entry));
-        combo->setCurrentIndex(0);
-    };
-    fill(comboGT, kGameTypeEntries);
-    fill(comboVideoMode, kVideoModeEntries);
-    fill(comboLeftController, kControllerEntries);
-    fill(comboRightController, kControllerEntries);
+    QMenu* popup = m_ui->mnuROMSPopup =
+        named(new QMenu(QStringLiteral("ROMSPopup"), this), "mnuROMSPopup");
+    m_ui->mnuROMSRemove = named(popup->addAction(QStringLiteral("Remove")), "mnuROMSRemove");
+    QAction* refresh = named(popup->addAction(QStringLiteral("Refresh")), "mnuROMSRefresh");
+    QAction* add = named(popup->addAction(QStringLiteral("Add Path")), "mnuROMSAdd");
+    connect(m_ui->mnuROMSRemove, &QAction::triggered, this, &frmSettings::mnuROMSRemove_Click);
+    connect(refresh, &QAction::triggered, this, &frmSettings::mnuROMSRefresh_Click);
+    connect(add, &QAction::triggered, this, &frmSettings::mnuROMSAdd_Click);
 }

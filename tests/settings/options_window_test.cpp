@@ -1,0 +1,391 @@
+#include "SettingsFixture.h"
+
+#include "emulator/Switches.h"
+#include "settings/SliderRules.h"
+#include "ui/cTextBoxXP.h"
+#include "ui/vbalProgressBar.h"
+
+#include <QAbstractButton>
+#include <QAction>
+#include <QApplication>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QFocusEvent>
+#include <QGroupBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QLocale>
+#include <QMenu>
+#include <QMouseEvent>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QSignalSpy>
+#include <QTest>
+
+#include <climits>
+
+namespace {
+
+// The option controls as a user meets them: each edits the window's options, which the
+// preview of the switches, the dependent controls and the bars then show.
+class OptionControls : public SettingsFixture {
+protected:
+    void SetUp() override {
+        // The sound queue's text follows the locale; these tests read it in English.
+        QLocale::setDefault(QLocale(QLocale::English, QLocale::UnitedStates));
+        w = open();
+        ASSERT_TRUE(QTest::qWaitForWindowActive(w.get()));
+    }
+    void TearDown() override {
+        w.reset();
+        QLocale::setDefault(m_savedLocale);
+    }
+
+    template <class T> T* get(const char* name) { return control<T>(*w, name); }
+    QString preview() { return get<QLabel>("lblDOSOutput")->text(); }
+    bool previewHas(const QString& sw) { return preview().split(u' ').contains(sw); }
+    // A bar's window, value and text: "4500..4700 at 4608 '4,608'".
+    std::string bar(const char* name) {
+        const auto* b = get<vbalProgressBar>(name);
+        return QStringLiteral("%1..%2 at %3 '%4'")
+            .arg(b->Min())
+            .arg(b->Max())
+            .arg(b->Value())
+            .arg(b->Text())
+            .toStdString();
+    }
+    static void mouse(vbalProgressBar* bar, QEvent::Type type, double x, Qt::MouseButton button,
+                      Qt::MouseButtons buttons) {
+        const QPointF at(x, bar->height() / 2.0);
+        QMouseEvent event(type, at, bar->mapToGlobal(at), button, buttons, {});
+        QCoreApplication::sendEvent(bar, &event);
+    }
+    static void press(vbalProgressBar* bar, double x) {
+        mouse(bar, QEvent::MouseButtonPress, x, Qt::LeftButton, Qt::LeftButton);
+        mouse(bar, QEvent::MouseButtonRelease, x, Qt::LeftButton, {});
+    }
+
+    std::unique_ptr<frmSettings> w;
+    QLocale m_savedLocale;
+};
+
+} // namespace
+
+TEST_F(OptionControls, EachControlSpeaksThroughItsSwitch) {
+    EXPECT_EQ(preview(), "-p8 -M1");
+    QSignalSpy changes(w.get(), &frmSettings::optionsChanged);
+    // Clicked in this order; each leaves its switch in the preview.
+    const std::pair<const char*, const char*> clicks[] = {
+        {"chkAllow4", "-4"},        {"chkBW", "-b"},
+        {"chkCodeTrace", "-t"},     {"chkFastCopy", "-z"},
+        {"chkInterlaced", "-!"},    {"chkIPCJoystick", "-iJ"},
+        {"chkMouseCapture", "-M0"}, {"chkP0Hard", "-0"},
+        {"chkP1Hard", "-1"},        {"chkPALColorLoss", "-o"},
+        {"chkPrintChecksum", "-x"}, {"chkQuiet", "-q"},
+        {"chkShowScanline", "-n"},  {"chkSwapControl", "-w"},
+        {"chkSyncWSound", "-R"},    {"chkScanLines", "-h0"},
+        {"chkLineScan", "-u0"},     {"chkLowerSens", "-P1"},
+        {"optCPNTSC", "-c0"},       {"optCPPAL", "-c1"},
+        {"optCPSECAM", "-c2"},      {"optDSPLow", "-d1"},
+        {"optDSPHigh", "-d2"},      {"optNarrow1", "-e1"},
+        {"optNarrow2", "-e2"},      {"optSCBMP", "-B"},
+        {"optVMWindow", "-v10"},    {"optVMFull", "-v0"},
+        {"optFPSmonitor", "-r"},    {"optPaddleM1_3", "-m3"},
+        {"optPaddleM2_1", "-m131"}, {"optPaddleM1None", "-m1"},
+        {"optFPScustom", "-r"},
+    };
+    for (const auto& [name, sw] : clicks) {
+        get<QAbstractButton>(name)->click();
+        EXPECT_TRUE(previewHas(sw)) << name << ": " << preview().toStdString();
+    }
+    // The other buttons of a group take their switch away again.
+    for (const auto& [name, gone] : {std::pair{"optCPDefault", "-c"},
+                                     {"optDSPDefault", "-d"},
+                                     {"optNarrowNot", "-e"},
+                                     {"optSCPCX", "-B"},
+                                     {"optVMDefault", "-v"},
+                                     {"optPaddleM2None", "-m"},
+                                     {"optFPSDefault", "-r"}}) {
+        get<QAbstractButton>(name)->click();
+        EXPECT_FALSE(preview().contains(QLatin1String(gone))) << name;
+    }
+    const std::pair<const char*, int> lists[] = {
+        {"comboGT", 7}, {"comboLeftController", 2}, {"comboRightController", 12}};
+    for (const auto& [name, index] : lists)
+        get<QComboBox>(name)->setCurrentIndex(index);
+    for (const auto& [name, text] :
+         {std::pair{"txtScanLines", "200"}, {"txtLineScan", "31"}, {"txtLowerSens", "5"}})
+        get<QLineEdit>(name)->setText(text);
+    for (const char* sw : {"-g7", "-)PC", "-(NC", "-h200", "-u31", "-P5"})
+        EXPECT_TRUE(previewHas(sw)) << sw;
+    EXPECT_EQ(get<QLineEdit>("txtDOSOutput")->text(), preview());
+    EXPECT_EQ(preview(), launchSwitches(w->options()).mid(1));
+    EXPECT_GE(changes.count(), 40);
+
+    // Shown from outside, the options change the controls and report no edit.
+    changes.clear();
+    w->setOptions(EmulatorOptions());
+    EXPECT_EQ(preview(), "-p8 -M1");
+    EXPECT_TRUE(get<QCheckBox>("chkMouseCapture")->isChecked());
+    EXPECT_EQ(changes.count(), 0);
+}
+
+// Options shown in one window and copied control by control into another, as a user
+// would set them, give the same options: every control shows its own option.
+TEST_F(OptionControls, WhatTheControlsShowTheyGiveBack) {
+    EmulatorOptions o;
+    o.videoMode = 4;
+    o.videoStart = VideoStart::Window;
+    o.dsp = DspLevel::Low;
+    o.player1Hard = o.inactiveMouse = o.showScanline = Check::Grayed;
+    o.blackAndWhite = o.inactiveJoystick = o.swapPorts = o.quiet = o.lowerSensitivity = Check::On;
+    o.palColorLoss = o.syncWithSound = o.scanLineLimit = o.codeTrace = Check::On;
+    o.noFastCopy = o.startLineEnabled = Check::On;
+    o.mouseCapture = Check::Off;
+    o.screenCapture = CaptureFormat::Bmp;
+    o.leftController = 5;
+    o.rightController = 3;
+    o.paddleSensitivity = 11;
+    o.lightGunCycles = "3";
+    o.lightGunScanlines = "7";
+    o.soundQueue = 5000;
+    o.lowerSensitivityBy = "4";
+    o.mousePaddle1 = Paddle::P2;
+    o.mousePaddle2 = Paddle::P0;
+    o.frameRate = FrameRate::Custom;
+    o.customFrameRate = "59";
+    o.narrow = NarrowMode::Mode1;
+    o.palette = Palette::Ntsc;
+    o.phosphor = 40;
+    o.scanLines = "250";
+    o.gameType = 9;
+    o.startLine = "30";
+    w->setOptions(o);
+    EXPECT_EQ(w->options(), o);
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4900..5100 at 5000 '5,000'");
+
+    auto copy = std::make_unique<frmSettings>(fake.platform);
+    for (const QWidget* from : w->findChildren<QWidget*>()) {
+        QWidget* to =
+            from->objectName().isEmpty() ? nullptr : copy->findChild<QWidget*>(from->objectName());
+        if (to == nullptr)
+            continue;
+        if (const auto* box = qobject_cast<const QCheckBox*>(from))
+            static_cast<QCheckBox*>(to)->setCheckState(box->checkState());
+        else if (const auto* button = qobject_cast<const QRadioButton*>(from))
+            static_cast<QRadioButton*>(to)->setChecked(button->isChecked() ||
+                                                       static_cast<QRadioButton*>(to)->isChecked());
+        else if (const auto* list = qobject_cast<const QComboBox*>(from))
+            static_cast<QComboBox*>(to)->setCurrentIndex(list->currentIndex());
+        else if (const auto* field = qobject_cast<const QLineEdit*>(from))
+            static_cast<QLineEdit*>(to)->setText(field->text());
+        else if (const auto* slider = qobject_cast<const vbalProgressBar*>(from)) {
+            static_cast<vbalProgressBar*>(to)->setValue(slider->Value());
+            emit static_cast<vbalProgressBar*>(to)->Change();
+        }
+    }
+    EXPECT_EQ(copy->options(), o);
+}
+
+TEST_F(OptionControls, ThePortsDecideWhichControlsCanBeUsed) {
+    get<QCheckBox>("chkIPCMouse")->click();
+    get<QComboBox>("comboLeftController")->setCurrentIndex(3);  // Keypad
+    get<QComboBox>("comboRightController")->setCurrentIndex(5); // LightGun
+    QString enabled;
+    for (const char* name : {"chkIPCKeyboard", "chkIPCMouse", "chkIPCJoystick", "chkIPCStella"})
+        enabled += get<QCheckBox>(name)->isEnabled() ? u'+' : u'-';
+    EXPECT_EQ(enabled, "++--");
+    EXPECT_EQ(get<QPushButton>("cmdLeftControlPic")->text(), "Keyboard Control Layout");
+    EXPECT_FALSE(get<QGroupBox>("fraLightgun")->isHidden());
+    EXPECT_FALSE(get<QGroupBox>("fraPaddleSens")->isHidden());
+    get<QCheckBox>("chkIPCKeyboard")->click();
+    EXPECT_TRUE(get<QGroupBox>("fraPaddleSens")->isHidden());
+    EXPECT_EQ(preview(), "-)KP -(LG -iKM -M1 -l0 -a0");
+    get<QComboBox>("comboRightController")->setCurrentIndex(0);
+    EXPECT_TRUE(get<QGroupBox>("fraLightgun")->isHidden());
+    EXPECT_TRUE(get<QCheckBox>("chkIPCMouse")->isChecked()); // disabled, never cleared
+}
+
+TEST_F(OptionControls, NumberFieldsTakeDigitsTidyUpAndAreSwitchedOnByTheirBoxes) {
+    const std::tuple<const char*, const char*, const char*> switchedOn[] = {
+        {"chkLineScan", "txtLineScan", "Debug"},
+        {"chkScanLines", "txtScanLines", "Video"},
+        {"chkLowerSens", "txtLowerSens", "PaddlesAudio"},
+        {"optFPScustom", "txtFPScustom", "Video"}};
+    for (const auto& [button, field, page] : switchedOn) {
+        w->selectPage(page);
+        EXPECT_FALSE(get<QLineEdit>(field)->isEnabled()) << field;
+        get<QAbstractButton>(button)->click();
+        EXPECT_TRUE(get<QLineEdit>(field)->isEnabled()) << field;
+        EXPECT_EQ(QApplication::focusWidget(), get<QLineEdit>(field)) << field;
+    }
+    for (const char* other : {"optFPSmonitor", "optFPSDefault"}) {
+        get<QAbstractButton>("optFPScustom")->click();
+        get<QAbstractButton>(other)->click();
+        EXPECT_FALSE(get<QLineEdit>("txtFPScustom")->isEnabled()) << other;
+    }
+
+    get<QComboBox>("comboLeftController")->setCurrentIndex(5);
+    get<QAbstractButton>("optFPScustom")->click();
+    for (const char* name : {"txtFPScustom", "txtLightGunCycles", "txtLightGunScan", "txtLineScan",
+                             "txtLowerSens", "txtScanLines"}) {
+        QLineEdit* field = get<QLineEdit>(name);
+        field->setText("9");
+        field->selectAll();
+        QTest::keyClicks(field, "1a-.2 +3,e");
+        QTest::keyClick(field, Qt::Key_Return);
+        EXPECT_EQ(field->text(), "123") << name;
+        // Keyboard focus puts the caret at the end, selecting nothing; a click leaves it.
+        for (const auto& [reason, to] :
+             {std::pair{Qt::TabFocusReason, 3}, {Qt::MouseFocusReason, 1}}) {
+            field->setCursorPosition(1);
+            QFocusEvent focusIn(QEvent::FocusIn, reason); // Qt itself would select all
+            QApplication::sendEvent(field, &focusIn);
+            QApplication::processEvents();
+            EXPECT_FALSE(field->hasSelectedText()) << name;
+            EXPECT_EQ(field->cursorPosition(), to) << name;
+        }
+    }
+    // Fields the emulator reads as numbers show their number at once; the others keep
+    // what the user left, even nothing.
+    for (const auto& [name, shown] : {std::pair{"txtScanLines", "0"},
+                                      {"txtLineScan", "0"},
+                                      {"txtLightGunCycles", "0"},
+                                      {"txtLightGunScan", "0"},
+                                      {"txtLowerSens", ""},
+                                      {"txtFPScustom", ""}}) {
+        get<QLineEdit>(name)->clear();
+        EXPECT_EQ(get<QLineEdit>(name)->text(), shown) << name;
+    }
+    get<QLineEdit>("txtScanLines")->setText("0012");
+    EXPECT_EQ(get<QLineEdit>("txtScanLines")->text(), "12");
+}
+
+TEST_F(OptionControls, PickingAVideoModeUnderDefaultWarnsEachTime) {
+    auto* list = get<QComboBox>("comboVideoMode");
+    auto* anchor = get<QLineEdit>("txtVidModeBalloon");
+    for (int pick : {3, 3, 5}) {
+        list->setCurrentIndex(pick);
+        emit list->activated(pick);
+        BalloonTip* tip = cTextBoxXP::shownOn(anchor);
+        ASSERT_NE(tip, nullptr) << pick;
+        EXPECT_EQ(tip->icon(), 1);
+        EXPECT_EQ(tip->title() + "|" + tip->text(),
+                  "Default Video Mode Selected|You need to select either 'Fullscreen' or\r\n"
+                  "'Window' for the Video Mode to be enabled.");
+        tip->close();
+    }
+    EXPECT_EQ(w->options().videoMode, 5); // the pick stays
+    get<QAbstractButton>("optVMWindow")->click();
+    list->setCurrentIndex(2);
+    emit list->activated(2);
+    EXPECT_EQ(cTextBoxXP::shownOn(anchor), nullptr);
+    EXPECT_TRUE(previewHas("-v12"));
+}
+
+TEST_F(OptionControls, EditSwitchesSwapsTheLabelForTheEditBoxAndEnterLaunches) {
+    const auto shown = [this] {
+        return QString::number(!get<QLineEdit>("txtDOSOutput")->isHidden()) +
+               QString::number(!get<QLabel>("lblDOSSwitchInstruction")->isHidden()) +
+               QString::number(!get<QLabel>("lblDOSOutput")->isHidden());
+    };
+    QSignalSpy launches(w.get(), &frmSettings::launchRequested);
+    w->selectPage("Debug");
+    get<QCheckBox>("chkDOSSwitch")->click();
+    EXPECT_TRUE(w->switchEditing());
+    EXPECT_EQ(shown(), "110");
+    auto* edit = get<QLineEdit>("txtDOSOutput");
+    EXPECT_EQ(QApplication::focusWidget(), edit);
+    QTest::keyClicks(edit, " -x");
+    EXPECT_EQ(w->editedSwitches(), "-p8 -M1 -x");
+    QTest::keyClick(edit, Qt::Key_Return);
+    ASSERT_EQ(launches.count(), 1);
+    EXPECT_EQ(launches[0][0].toBool(), true);
+    get<QCheckBox>("chkQuiet")->click(); // an option change overwrites the edits
+    EXPECT_EQ(w->editedSwitches(), "-p8 -M1 -q");
+    get<QCheckBox>("chkDOSSwitch")->click();
+    EXPECT_EQ(shown(), "001");
+
+    // Pasted markup shows as typed.
+    get<QAbstractButton>("optFPScustom")->click();
+    get<QLineEdit>("txtFPScustom")->setText("<b>5");
+    EXPECT_EQ(get<QLabel>("lblDOSOutput")->textFormat(), Qt::PlainText);
+    EXPECT_TRUE(previewHas("-r<b>5"));
+}
+
+TEST_F(OptionControls, SliderBarsSetTheirOptionByMouseKeysAndMenu) {
+    EXPECT_EQ(bar("BarColorPaddle"), "1..15 at 8 '8'");
+    EXPECT_EQ(bar("BarColorPhos"), "0..100 at 77 '77'");
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4500..4700 at 4608 '4,608'");
+    // A press at either end takes the bar's end value; a press beyond is held there.
+    const std::tuple<const char*, const char*, const char*, const char*> ends[] = {
+        {"BarColorPaddle", "Controls", "1..15 at 15 '15'", "-p15"},
+        {"BarColorPhos", "Video", "0..100 at 0 '0'", "-f0"},
+        {"BarColorSoundQueue", "PaddlesAudio", "4500..4700 at 4700 '4,700'", "-s4700"}};
+    for (const auto& [name, page, state, sw] : ends) {
+        w->selectPage(page);
+        auto* b = get<vbalProgressBar>(name);
+        press(b, std::string(name) == "BarColorPhos" ? -20.0 : b->width() + 20.0);
+        EXPECT_EQ(bar(name), state);
+        EXPECT_TRUE(previewHas(sw)) << name;
+    }
+    mouse(get<vbalProgressBar>("BarColorPhos"), QEvent::MouseButtonDblClick, 5, Qt::LeftButton,
+          Qt::LeftButton);
+    EXPECT_EQ(bar("BarColorPhos"), "0..100 at 77 '77'");
+
+    // The sound queue: + and - move its scale, a value left behind lands inside; the
+    // menu does the same and resets; the right button only opens the menu.
+    auto* queue = get<vbalProgressBar>("BarColorSoundQueue");
+    QTest::keyClick(queue, '+');
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4600..4800 at 4700 '4,700'");
+    QTest::keyClick(queue, '+');
+    QTest::keyClick(queue, '+');
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4800..5000 at 4805 '4,805'");
+    EXPECT_TRUE(previewHas("-s4805"));
+    auto* menu = get<QMenu>("mnuSQPopup");
+    mouse(queue, QEvent::MouseButtonPress, 3, Qt::RightButton, Qt::RightButton);
+    EXPECT_TRUE(menu->isVisible());
+    menu->hide();
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4800..5000 at 4805 '4,805'");
+    get<QAction>("mnuSQShiftDown")->trigger();
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4700..4900 at 4805 '4,805'");
+    get<QAction>("mnuSQReset")->trigger();
+    EXPECT_EQ(bar("BarColorSoundQueue"), "4500..4700 at 4608 '4,608'");
+    EXPECT_EQ(preview(), "-p15 -M1");
+}
+
+TEST(SliderRules, SoundQueueShiftsStayOnTheScale) {
+    using sliders::Scale;
+    const Scale start{4500, 4700, 4608};
+    const struct {
+        const char* what;
+        Scale start;
+        std::string keys;
+        Scale expected;
+    } cases[] = {
+        {"down then up keeps a value inside", start, "-+", {4500, 4700, 4595}},
+        {"the bottom window is 1..201", start, std::string(700, '-'), {1, 201, 196}},
+        {"up at the top keeps the value", {65339, 65536, 65400}, "+", {65339, 65536, 65400}},
+        {"partial step up to the top", {65300, 65500, 65310}, "+", {65339, 65536, 65344}},
+        {"any key brings a high value in", {65339, 65536, 70000}, "x", {65339, 65536, 65536}},
+        {"any key mends a window below", {-100, 100, 0}, "x", {1, 201, 1}},
+        {"no overflow up", {INT_MAX - 200, INT_MAX, INT_MAX}, "+", {65339, 65536, 65536}},
+        {"no overflow down", {INT_MIN, INT_MIN + 200, INT_MIN}, "-", {1, 201, 1}},
+    };
+    for (const auto& c : cases) {
+        Scale scale = c.start;
+        for (const char key : c.keys)
+            scale = sliders::ShiftSoundQueue(scale, key);
+        EXPECT_TRUE(scale == c.expected)
+            << c.what << ": " << scale.min << ".." << scale.max << " at " << scale.value;
+    }
+    for (const auto& [value, separator, text] :
+         {std::tuple{qint64(999), u",", u"999"},
+          {-4608, u",", u"-4,608"},
+          {std::numeric_limits<qint64>::min(), u",", u"-9,223,372,036,854,775,808"},
+          {1234567, u"\u202F", u"1\u202F234\u202F567"}})
+        EXPECT_EQ(sliders::FormatThousands(value, QString::fromUtf16(separator)),
+                  QString::fromUtf16(text));
+    // Always grouped, even where the locale would leave a four-digit number alone.
+    EXPECT_EQ(sliders::SoundQueueText(4608, QLocale(QLocale::Spanish, QLocale::Spain)), "4.608");
+}

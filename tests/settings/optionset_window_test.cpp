@@ -1,0 +1,123 @@
+#include "SettingsFixture.h"
+
+#include "support/DiskFull.h"
+#include "support/Files.h"
+
+#include "emulator/OptionFile.h"
+
+#include <QComboBox>
+#include <QFile>
+#include <QLabel>
+#include <QRadioButton>
+#include <QtEndian>
+
+namespace {
+
+// The Save and Load buttons and the load of a damaged set, as the window shows them. (Every
+// shape of a set on disk is read by the option set's own tests.)
+class OptionSetButtons : public SettingsFixture {
+protected:
+    void save(frmSettings& w, const QString& chosen) {
+        fake.dialogs.paths.push_back(chosen);
+        w.cmdSaveDat_Click();
+    }
+    QString status(const frmSettings& w) { return control<QLabel>(w, "lblConfig")->text(); }
+};
+
+} // namespace
+
+TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
+    auto w = open();
+    w->showConfigStatus("before", "tip");
+    w->cmdSaveDat_Click(); // cancelled
+    w->cmdLoadDat_Click(); // cancelled
+    EXPECT_EQ(status(*w), "before");
+    EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "tip");
+    ASSERT_EQ(fake.dialogs.fileRequests.size(), 2u);
+    for (const auto& [bSave, request] : fake.dialogs.fileRequests) {
+        EXPECT_EQ(QStringList({request.title, request.filter, request.initialFolder}),
+                  QStringList({"Choose File to Save Configuration",
+                               "lum configurations (*.lum)|*.lum|All Files (*.*)|*.*",
+                               fake.programFolder()}));
+        EXPECT_EQ(request.filterIndex, 1);
+        EXPECT_EQ(request.flags, bSave ? 0x2u : 0x1800u);
+    }
+    EXPECT_TRUE(fake.dialogs.fileRequests[0].save);
+
+    // The name as chosen in the status line; ".lum" added unless the name ends in it.
+    control<QRadioButton>(*w, "optCPPAL")->click();
+    for (const auto& [chosen, written] :
+         {std::pair{"name", "name.lum"}, {"NAME.LUM", "NAME.LUM"}}) {
+        save(*w, fake.root() + "/" + chosen);
+        EXPECT_EQ(fileBytes(fake.root() + "/" + written), encodeOptions(w->options())) << chosen;
+        EXPECT_EQ(status(*w), QString(chosen) + " was succesfully saved");
+    }
+    EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "");
+    EXPECT_FALSE(QFile::exists(fake.root() + "/name"));
+
+    auto other = open();
+    fake.dialogs.paths = {fake.root() + "/name.lum"};
+    other->cmdLoadDat_Click();
+    EXPECT_EQ(status(*other), "name.lum was succesfully loaded");
+    EXPECT_EQ(other->options().palette, Palette::Pal);
+    EXPECT_TRUE(control<QRadioButton>(*other, "optCPPAL")->isChecked());
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_FALSE(other->isHidden()); // a good load leaves the window as it was
+}
+
+TEST_F(OptionSetButtons, ACorruptSetIsReportedWithWhatCameBeforeTheBadValueShown) {
+    QByteArray bytes = encodeOptions(EmulatorOptions());
+    qToLittleEndian<qint16>(3, bytes.data());      // video mode 3
+    qToLittleEndian<qint16>(3, bytes.data() + 14); // "Player 0 hard": no such state
+    qToLittleEndian<qint16>(1, bytes.data() + 16); // "Player 1 hard", after it
+    ASSERT_TRUE(putFile(fake.root() + "/bad.lum", bytes));
+
+    auto w = std::make_unique<frmSettings>(fake.platform); // hidden, as at start-up
+    w->selectPage("Video");
+    fake.dialogs.paths = {fake.root() + "/bad.lum"};
+    w->cmdLoadDat_Click();
+    EXPECT_EQ(status(*w),
+              "bad.lum is corrupt.  Plese verify settings an re-save to correct the problem");
+    EXPECT_EQ(boxLines(fake.dialogs), Lines{"lum | .lum file is corrupt\r\nPlease verify settings "
+                                            "and re-save to correct this problem | Ok | None"});
+    EXPECT_EQ(control<QComboBox>(*w, "comboVideoMode")->currentIndex(), 3);
+    EXPECT_EQ(w->options().player1Hard, Check::Off);
+    EXPECT_TRUE(w->isVisible());
+    EXPECT_EQ(w->selectedPage(), "Settings");
+
+    // A file that cannot be read applies nothing and is reported alike.
+    EXPECT_FALSE(w->LoadSettings(fake.root() + "/missing.lum"));
+    EXPECT_EQ(w->options().videoMode, 3);
+    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
+}
+
+TEST_F(OptionSetButtons, SavingNeverLosesAFile) {
+    auto w = open();
+    save(*w, fake.root() + "/no such folder/set");
+    EXPECT_EQ(status(*w), "error saving set");
+
+    const QString older = fake.root() + "/older.lum";
+    ASSERT_TRUE(putFile(older, QByteArray(172, '\x11')));
+    {
+        const DiskFull limit(16);
+        save(*w, older);
+    }
+    EXPECT_EQ(status(*w), "error saving older.lum");
+    EXPECT_EQ(fileBytes(older), QByteArray(172, '\x11'));
+
+    // A name the extension was added to does not replace a file unasked.
+    w->showConfigStatus("before", {});
+    fake.dialogs.answers = {MsgResult::No, MsgResult::Yes};
+    save(*w, fake.root() + "/older");
+    EXPECT_EQ(fileBytes(older), QByteArray(172, '\x11'));
+    EXPECT_EQ(status(*w), "before");
+    save(*w, fake.root() + "/older");
+    EXPECT_EQ(fileBytes(older), encodeOptions(EmulatorOptions()));
+    EXPECT_EQ(status(*w), "older was succesfully saved");
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines(2, "Choose File to Save Configuration | older.lum already exists.\r\nDo you "
+                       "want to replace it? | YesNo | Exclamation"));
+    // A name chosen with its extension was asked about by the chooser itself.
+    save(*w, older);
+    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
+}
