@@ -2,7 +2,7 @@
 
 #include "about/frmAbout.h"
 #include "app/MenuIcons.h"
-#include "emulator/ConfigRecord.h"
+#include "emulator/OptionFile.h"
 #include "library/CCRC32.h"
 #include "library/GameDatabase.h"
 #include "library/RomListModel.h"
@@ -10,8 +10,8 @@
 #include "platform/Dialogs.h"
 #include "platform/FileSystem.h"
 #include "platform/Platform.h"
-#include "platform/SettingsStore.h"
 #include "platform/Shell.h"
+#include "platform/StoredSettings.h"
 #include "platform/WebAddresses.h"
 #include "settings/DefaultPaths.h"
 #include "settings/frmSettings.h"
@@ -33,24 +33,16 @@
 #include <QLineEdit>
 #include <QMenuBar>
 
+#include <climits>
 #include <cmath>
 
-namespace {
-
-const QString kSettings = QStringLiteral("Settings");
-const QString kWinpos = QStringLiteral("winpos");
-
-// The store's keys of ROM folder n: ROMPath, ROM2Path, ROM3Path, ...
-QString folderKey(int n, const char* suffix) {
-    return QStringLiteral("ROM") + (n == 1 ? QString() : QString::number(n)) +
-           QLatin1String(suffix);
-}
-
-} // namespace
-
 frmMain::frmMain(Platform& platform) : m_platform(platform) {
-    // First, so that the listing has the whole building of the window to run in.
-    startFirstListing();
+    // First, so that the listing has the whole building of the window to run in: a large
+    // collection takes longer to list than the window to build and show.
+    const SettingsStore& store = m_platform.store;
+    const QStringList folders = enabledRomFolders(store);
+    if (!folders.isEmpty() && !read(store, stored::z26Path).isEmpty())
+        m_catalogue.prefetch(folders, read(store, stored::romFilter));
     setObjectName(QStringLiteral("frmMain"));
     setWindowTitle(QStringLiteral("lum"));
     createControls();
@@ -58,48 +50,6 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
 }
 
 frmMain::~frmMain() = default;
-
-QStringList frmMain::enabledRomFolders() const {
-    const SettingsStore& store = m_platform.store;
-    QStringList folders;
-    for (int n = 1;; ++n) {
-        const QString path = store.GetSetting(kSettings, folderKey(n, "Path"));
-        if (path.isEmpty())
-            break;
-        if (readBool(store, kSettings, folderKey(n, "Checked"), false))
-            folders.push_back(path);
-    }
-    return folders;
-}
-
-void frmMain::startFirstListing() {
-    // Listing a large collection takes longer than building and showing the window, so it
-    // runs on another core meanwhile; the load's refresh takes the result over.
-    m_firstListingFolders = enabledRomFolders();
-    m_firstListingPattern = storedRomFilter(m_platform.store);
-    if (m_firstListingFolders.isEmpty() ||
-        m_platform.store.GetSetting(kSettings, QStringLiteral("Z26Path")).isEmpty())
-        return;
-    m_firstListing = std::async(
-        std::launch::async, [folders = m_firstListingFolders, pattern = m_firstListingPattern] {
-            const FilePattern filePattern(pattern);
-            std::vector<RomFolderListing> listings;
-            for (const QString& folder : folders)
-                listings.push_back({folder, listMatchingFiles(folder, filePattern)});
-            return listings;
-        });
-}
-
-std::vector<frmMain::RomFolderListing> frmMain::takeFirstListing(const QStringList& folders,
-                                                                 const QString& pattern) {
-    if (!m_firstListing.valid())
-        return {};
-    std::vector<RomFolderListing> listings = m_firstListing.get();
-    // Folders or a pattern changed since the start are listed again.
-    if (folders != m_firstListingFolders || pattern != m_firstListingPattern)
-        return {};
-    return listings;
-}
 
 void frmMain::createControls() {
     auto* central = new QWidget(this);
@@ -144,29 +94,23 @@ void frmMain::createSettingsWindow() {
     // Built when first needed: its pages cost more than the whole main window, and
     // nothing of them shows at start-up.
     m_settings = std::make_unique<frmSettings>(m_platform);
-    m_settings->setLoadRomHandler([this](bool ForceLoad) { LoadROM(ForceLoad); });
-    if (m_defaultOptionSet) {
-        m_settings->LoadSettings(*m_defaultOptionSet);
-        m_defaultOptionSet.reset();
+    connect(m_settings.get(), &frmSettings::launchRequested, this, &frmMain::LoadROM);
+    if (m_startOptions) {
+        m_settings->setOptions(*m_startOptions);
+        m_startOptions.reset();
     }
     if (m_configCaption) {
-        showConfigCaption(m_configCaption->first, m_configCaption->second);
+        m_settings->showConfigStatus(m_configCaption->first, m_configCaption->second);
         m_configCaption.reset();
     }
-    const std::vector<vbalProgressBar*> bars = {
-        m_settings->BarColorPaddle, m_settings->BarColorSoundQueue, m_settings->BarColorPhos};
-    for (vbalProgressBar* bar : bars)
-        bar->setForeColor(0);
-    applyBackgroundTo(bars);
+    ApplyBackground();
 }
 
 void frmMain::showConfigCaption(const QString& text, const QString& tip) {
-    if (!m_settings) {
+    if (m_settings)
+        m_settings->showConfigStatus(text, tip);
+    else
         m_configCaption.emplace(text, tip);
-        return;
-    }
-    m_settings->lblConfig->setText(text);
-    m_settings->lblConfig->setToolTip(tip);
 }
 
 void frmMain::createMenus() {
@@ -267,12 +211,13 @@ void frmMain::Form_Load() {
     const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
     if (FileExist(defaultFile)) {
         // A sound option set waits for the settings window; a corrupt one is reported now.
-        ConfigDecode optionSet = frmSettings::readOptionSet(defaultFile);
+        const OptionSetRead optionSet =
+            readOptionFile(defaultFile, m_settings ? m_settings->options() : EmulatorOptions());
         const bool loaded = optionSet.ok();
         if (m_settings || !loaded)
             settingsWindow().LoadSettings(optionSet);
         else
-            m_defaultOptionSet = std::make_unique<ConfigDecode>(std::move(optionSet));
+            m_startOptions = optionSet.options;
         showConfigCaption(loaded ? QStringLiteral("Default.lum was succesfully loaded")
                                  : QStringLiteral("Default.lum is corrupt.  Please verify "
                                                   "settings and re-save to correct the problem."),
@@ -282,39 +227,24 @@ void frmMain::Form_Load() {
                           QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));
     }
 
-    SettingsStore& store = m_platform.store;
-    File1.setPattern(
-        store.GetSetting(kSettings, QStringLiteral("ROMFilter"), QStringLiteral("*.*")));
-
-    const double height = readSingle(store, kWinpos, QStringLiteral("height"), 6570);
-    const double width = readSingle(store, kWinpos, QStringLiteral("width"), 4905);
-    const double top = readSingle(store, kWinpos, QStringLiteral("top"), 500);
-    const double left = readSingle(store, kWinpos, QStringLiteral("left"), 500);
-    resize(twips::toPixelsX(width), twips::toPixelsY(height));
-    move(twips::toPixelsX(left), twips::toPixelsY(top));
-    if (readBool(store, kWinpos, QStringLiteral("max"), false))
+    const SettingsStore& store = m_platform.store;
+    const WindowPlace place = read(store, stored::mainWindow);
+    resize(twips::toPixelsX(place.width), twips::toPixelsY(place.height));
+    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
+    if (read(store, stored::mainWindowMaximized))
         setWindowState(windowState() | Qt::WindowMaximized);
 
-    vbalListViewCtl1->setBackColor(
-        readColour(store, kSettings, QStringLiteral("BackColor"), kOleWhite));
-    mnuBackImgEnabled->setChecked(
-        readBool(store, kSettings, QStringLiteral("BackImgEnabled"), true));
-    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked()
-                                     ? store.GetSetting(kSettings, QStringLiteral("BackImg"))
-                                     : QString());
-    vbalListViewCtl1->setForeColor(readColour(store, kSettings, QStringLiteral("TextColor"), 0));
-
-    for (vbalProgressBar* bar : progressBars()) {
-        bar->setForeColor(0);
-        bar->setBarColor(vbalListViewCtl1->BackColor());
-        bar->setBarForeColor(vbalListViewCtl1->ForeColor());
-    }
+    vbalListViewCtl1->setBackColor(read(store, stored::backColor));
+    mnuBackImgEnabled->setChecked(read(store, stored::backImgEnabled));
+    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked() ? read(store, stored::backImg)
+                                                                : QString());
+    vbalListViewCtl1->setForeColor(read(store, stored::textColor));
     ApplyBackground();
 
-    const QString romPath = store.GetSetting(kSettings, QStringLiteral("ROMPath"));
-    m_sZ26Path = store.GetSetting(kSettings, QStringLiteral("Z26Path"));
+    const QString z26Path = read(store, stored::z26Path);
+    const bool bRomPath = !readRomFolders(store).empty();
 
-    if (!m_sZ26Path.isEmpty() && !romPath.isEmpty()) {
+    if (!z26Path.isEmpty() && bRomPath) {
         addListColumns();
 
         show();
@@ -324,9 +254,9 @@ void frmMain::Form_Load() {
         m_bInitialLoad = false;
         return;
     }
-    m_firstListing = {}; // nothing to fill without both paths
+    m_catalogue.dropPrefetch(); // nothing to fill without both paths
 
-    if (m_sZ26Path.isEmpty())
+    if (z26Path.isEmpty())
         m_platform.dialogs.MsgBox(
             this, QStringLiteral("You need to select you z26 path before you continue."),
             MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose z26 Path"));
@@ -334,7 +264,7 @@ void frmMain::Form_Load() {
         m_platform.dialogs.MsgBox(
             this, QStringLiteral("You need to select you ROM's path before you continue."),
             MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose ROM's Path"));
-    settingsWindow().SelectTab(QStringLiteral("DefaultPaths"));
+    settingsWindow().selectPage(QStringLiteral("DefaultPaths"));
     settingsWindow().show();
 }
 
@@ -350,12 +280,11 @@ void frmMain::addListColumns() {
 }
 
 void frmMain::RefreshMainList() {
-    SettingsStore& store = m_platform.store;
     // A list first filled after the paths were chosen on a first run still needs its
     // columns, or its rows would not show until the next start.
     if (m_listModel->columnCount() == 0)
         addListColumns();
-    File1.setPattern(m_settings ? m_settings->txtDefPathFilter->text() : storedRomFilter(store));
+    const SettingsStore& store = m_platform.store;
     const QString search = txtSearch->text().trimmed();
 
     // The first load's listing is already under way on another core, so its caption is
@@ -366,92 +295,33 @@ void frmMain::RefreshMainList() {
         QCoreApplication::processEvents();
     }
 
-    // Counting pass. Each enabled folder is listed once; the scanning pass below reuses
-    // the listing, so both passes see the same files.
-    const QStringList folderPaths = enabledRomFolders();
-    std::vector<RomFolderListing> listings;
-    if (m_bInitialLoad)
-        listings = takeFirstListing(folderPaths, File1.pattern());
-    if (listings.empty()) {
-        for (const QString& path : folderPaths) {
-            File1.setPath(path);
-            listings.push_back({path, File1.takeNames()});
-        }
-    }
-    double total = 0;
-    for (const RomFolderListing& listing : listings)
-        total += static_cast<double>(listing.names.size());
-
-    if (!m_bInitialLoad) {
-        fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
-        QCoreApplication::processEvents();
-    }
-
-    txtSearch->hide();
-    vbalProgressBar1->setMin(0);
-    if (total > 0)
-        vbalProgressBar1->setMax(static_cast<int>(std::nearbyint(total)));
-    vbalProgressBar1->setValue(0);
-    vbalProgressBar1->show();
-
-    m_listModel->clear();
-
-    // Scanning pass: the rows are gathered first and handed to the list in one batch.
-    QStringList folders;
-    NameList names;
-    std::vector<int> rowFolders;
-    const SearchExpression expression(search);
-    int done = 0;
-    long long shownPercent = -1;
-    int shownUntil = -1; // the last value known to give the percent shown
-    const auto advance = [&](int value) {
-        vbalProgressBar1->setValue(value);
-        // The percent text only changes when its rounded value does. Values only grow
-        // here, so where the next change comes is worked out once per percent.
-        if (value <= shownUntil)
-            return;
-        const auto percentAt = [&](int v) { return std::llround(vbalProgressBar1->PercentAt(v)); };
-        const long long percent = percentAt(value);
-        if (percent != shownPercent) {
-            shownPercent = percent;
-            vbalProgressBar1->setText(QString::number(percent) + u'%');
-        }
-        shownUntil = progressbar::runEnd(value, +1, [&](int v) { return percentAt(v) == percent; });
-    };
-    for (RomFolderListing& listing : listings) {
-        const int folderIndex = static_cast<int>(folders.size());
-        folders.push_back(listing.folder);
-        const int count = static_cast<int>(listing.names.size());
-        for (int i = 0; i < count; ++i) {
-            advance(i + done);
-            const QStringView name = listing.names.at(i);
-            if (!search.isEmpty() && expression.matches(name)) {
-                names.append(name);
-                rowFolders.push_back(folderIndex);
+    bool bListed = false;
+    const auto progress = [&](qint64 done, qint64 total) {
+        if (!bListed) {
+            bListed = true;
+            if (!m_bInitialLoad) {
+                fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
+                QCoreApplication::processEvents();
             }
+            txtSearch->hide();
+            vbalProgressBar1->setMin(0);
+            if (total > 0)
+                vbalProgressBar1->setMax(static_cast<int>(std::min<qint64>(total, INT_MAX)));
+            vbalProgressBar1->setValue(0);
+            vbalProgressBar1->show();
+            m_listModel->clear();
         }
-        advance(count + done);
-        done += count;
-        // Without a search every name is a row, so the folder's names are taken whole.
-        if (search.isEmpty()) {
-            rowFolders.insert(rowFolders.end(), static_cast<size_t>(count), folderIndex);
-            names.append(std::move(listing.names));
-        }
-    }
-    m_listModel->setRows(std::move(folders), std::move(names), std::move(rowFolders));
-
-    const int k = m_listModel->rowCount();
-    QString mark = k == 1 ? QString() : QStringLiteral("'s");
-    if (m_bInitialLoad) {
-        setWindowTitle(QStringLiteral("lum - %1 ROM%2 Found").arg(k).arg(mark));
-    } else {
-        if (!mark.isEmpty())
-            mark = QStringLiteral("es");
-        setWindowTitle(QStringLiteral("lum - %1 Match%2 out of %3")
-                           .arg(k)
-                           .arg(mark)
-                           .arg(static_cast<qint64>(total)));
-    }
+        const int value = static_cast<int>(std::min<qint64>(done, INT_MAX));
+        vbalProgressBar1->setValue(value);
+        vbalProgressBar1->setText(
+            QString::number(std::llround(vbalProgressBar1->PercentAt(value))) + u'%');
+    };
+    RomRows rows = m_catalogue.refresh(enabledRomFolders(store), read(store, stored::romFilter),
+                                       search, progress);
+    const qint64 listed = rows.listed;
+    m_listModel->setRows(std::move(rows.folders), std::move(rows.names),
+                         std::move(rows.rowFolders));
+    setWindowTitle(refreshCaption(m_bInitialLoad, m_listModel->rowCount(), listed));
 
     fraSearch->setTitle(QStringLiteral("Only show filenames containing..."));
     vbalProgressBar1->hide();
@@ -497,17 +367,11 @@ void frmMain::closeEvent(QCloseEvent* event) {
 void frmMain::Form_Unload() {
     SettingsStore& store = m_platform.store;
     if (!isMinimized()) {
-        if (isMaximized()) {
-            store.SaveSetting(kWinpos, QStringLiteral("max"), boolText(true));
-        } else {
-            store.SaveSetting(kWinpos, QStringLiteral("max"), boolText(false));
-            store.SaveSetting(kWinpos, QStringLiteral("top"), singleText(twips::fromPixelsY(y())));
-            store.SaveSetting(kWinpos, QStringLiteral("left"), singleText(twips::fromPixelsX(x())));
-            store.SaveSetting(kWinpos, QStringLiteral("height"),
-                              singleText(twips::fromPixelsY(height())));
-            store.SaveSetting(kWinpos, QStringLiteral("width"),
-                              singleText(twips::fromPixelsX(width())));
-        }
+        write(store, stored::mainWindowMaximized, isMaximized());
+        if (!isMaximized())
+            write(store, stored::mainWindow,
+                  {twips::fromPixelsY(y()), twips::fromPixelsX(x()), twips::fromPixelsX(width()),
+                   twips::fromPixelsY(height())});
     }
     // Every other window goes with the main one, the settings window saving its state.
     for (QWidget* window : QApplication::topLevelWidgets()) {
@@ -626,14 +490,14 @@ void frmMain::mnuBackColorChange_Click() {
         return;
     const quint32 colour = *chosen & 0xFFFFFF;
     SettingsStore& store = m_platform.store;
-    store.SaveSetting(kSettings, QStringLiteral("BackColor"), QString::number(colour));
+    write(store, stored::backColor, colour);
     vbalListViewCtl1->setBackColor(colour);
     const quint32 text = 16777215 - colour;
-    store.SaveSetting(kSettings, QStringLiteral("TextColor"), QString::number(text));
+    write(store, stored::textColor, text);
     vbalListViewCtl1->setForeColor(text);
     mnuBackImgEnabled->setChecked(false);
     vbalListViewCtl1->setPicture(QString());
-    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"), boolText(false));
+    write(store, stored::backImgEnabled, false);
     ApplyBackground();
 }
 
@@ -643,7 +507,7 @@ void frmMain::mnuTextColor_Click() {
     if (!chosen)
         return;
     const quint32 colour = *chosen & 0xFFFFFF;
-    m_platform.store.SaveSetting(kSettings, QStringLiteral("TextColor"), QString::number(colour));
+    write(m_platform.store, stored::textColor, colour);
     vbalListViewCtl1->setForeColor(colour);
     ApplyBackground();
 }
@@ -659,55 +523,41 @@ void frmMain::mnuBackImgChange_Click() {
     SettingsStore& store = m_platform.store;
     const QString chosen = m_platform.dialogs.ShowOpen(this, request);
     if (!chosen.isEmpty())
-        store.SaveSetting(kSettings, QStringLiteral("BackImg"), chosen);
+        write(store, stored::backImg, chosen);
     // Chosen or cancelled, the picture is switched on with the stored file.
     mnuBackImgEnabled->setChecked(true);
-    vbalListViewCtl1->setPicture(store.GetSetting(kSettings, QStringLiteral("BackImg")));
-    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"), boolText(true));
+    vbalListViewCtl1->setPicture(read(store, stored::backImg));
+    write(store, stored::backImgEnabled, true);
     ApplyBackground();
 }
 
 void frmMain::mnuBackImgEnabled_Click() {
     // The action has already flipped its check mark when it is triggered from the menu.
     SettingsStore& store = m_platform.store;
-    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked()
-                                     ? store.GetSetting(kSettings, QStringLiteral("BackImg"))
-                                     : QString());
-    store.SaveSetting(kSettings, QStringLiteral("BackImgEnabled"),
-                      boolText(mnuBackImgEnabled->isChecked()));
+    vbalListViewCtl1->setPicture(mnuBackImgEnabled->isChecked() ? read(store, stored::backImg)
+                                                                : QString());
+    write(store, stored::backImgEnabled, mnuBackImgEnabled->isChecked());
     ApplyBackground();
 }
 
-std::vector<vbalProgressBar*> frmMain::progressBars() const {
-    if (!m_settings)
-        return {vbalProgressBar1};
-    return {vbalProgressBar1, m_settings->BarColorPaddle, m_settings->BarColorSoundQueue,
-            m_settings->BarColorPhos};
-}
-
 void frmMain::ApplyBackground() {
-    applyBackgroundTo(progressBars());
-}
-
-void frmMain::applyBackgroundTo(const std::vector<vbalProgressBar*>& bars) {
-    QImage picture;
-    QImage barPicture;
+    BarLook look;
     if (mnuBackImgEnabled->isChecked()) {
-        picture = m_backdrop;
-        barPicture =
-            loadPictureFile(m_platform.store.GetSetting(kSettings, QStringLiteral("BackImg")));
+        look.picture = m_backdrop;
+        look.barPicture = loadPictureFile(read(m_platform.store, stored::backImg));
     }
-    for (vbalProgressBar* bar : bars) {
-        bar->setPicture(picture);
-        bar->setBarPicture(barPicture);
-        bar->setBarForeColor(vbalListViewCtl1->ForeColor());
-        bar->setBarColor(vbalListViewCtl1->BackColor());
-    }
+    look.barColor = vbalListViewCtl1->BackColor();
+    look.barForeColor = vbalListViewCtl1->ForeColor();
+    vbalProgressBar1->setPicture(look.picture);
+    vbalProgressBar1->setBarPicture(look.barPicture);
+    vbalProgressBar1->setBarForeColor(look.barForeColor);
+    vbalProgressBar1->setBarColor(look.barColor);
+    if (m_settings)
+        m_settings->setBarLook(look);
 }
 
 void frmMain::showEmulatorDocument(const QString& fileName) {
-    m_sZ26Path = m_platform.store.GetSetting(kSettings, QStringLiteral("Z26Path"));
-    QString folder = m_sZ26Path;
+    QString folder = read(m_platform.store, stored::z26Path);
     // A stored path of the emulator itself names its folder's documents; a folder that
     // merely has the emulator's name is kept.
     const QString suffix = u'/' + QStringLiteral("z26");

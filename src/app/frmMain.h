@@ -1,17 +1,16 @@
 #pragma once
 
-#include "library/FileLister.h"
+#include "emulator/EmulatorOptions.h"
+#include "library/RomCatalogue.h"
 
 #include <QImage>
 #include <QMainWindow>
 
-#include <future>
 #include <memory>
 #include <optional>
 #include <utility>
 #include <vector>
 
-struct ConfigDecode;
 struct Platform;
 class frmSettings;
 class ListView;
@@ -38,7 +37,7 @@ public:
     // Rebuilds the ROM list from the enabled folders, the file pattern and the search box.
     void RefreshMainList();
 
-    // Starts the emulator on the selected ROM with the settings window's switches, after
+    // Starts the emulator on the selected ROM with the settings window's options, after
     // checking the paths and the options that would spoil the game. With "Edit Switches"
     // on it hands the switches to the user instead, unless ForceLoad: then it starts with
     // the switches as the user edited them.
@@ -48,6 +47,12 @@ public:
     frmSettings& settingsWindow();
     RomListModel& listModel() { return *m_listModel; }
 
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
+
+private:
     // Controls, by the names the rest of the program knows them by.
     QGroupBox* fraSelectRom = nullptr;
     ListView* vbalListViewCtl1 = nullptr;
@@ -55,7 +60,6 @@ public:
     QLineEdit* txtSearch = nullptr;
     vbalProgressBar* vbalProgressBar1 = nullptr;
     QLabel* picBack = nullptr;
-    FileLister File1;
 
     QMenu* mnuFile = nullptr;
     QAction* mnuFileLoadSettings = nullptr;
@@ -79,7 +83,6 @@ public:
     QAction* mnuMainGameInfo = nullptr;
 
     bool m_bInitialLoad = false;
-    QString m_sZ26Path;
 
     // The search box's handlers: Enter refreshes, Ctrl+A / Ctrl+O / Ctrl+N insert an
     // operator at the caret; a double-click shows the search help.
@@ -88,12 +91,6 @@ public:
     void vbalListViewCtl1_KeyDown(int key);
     void vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos);
 
-protected:
-    bool eventFilter(QObject* watched, QEvent* event) override;
-    void resizeEvent(QResizeEvent* event) override;
-    void closeEvent(QCloseEvent* event) override;
-
-private:
     void createControls();
     void createMenus();
     void addListColumns();
@@ -109,14 +106,12 @@ private:
     void mnuTextColor_Click();
     void mnuBackImgChange_Click();
     void mnuBackImgEnabled_Click();
+    // The list's colours and picture on the bars that follow them: the refresh's progress
+    // bar and the settings window's slider bars.
     void ApplyBackground();
-    void applyBackgroundTo(const std::vector<vbalProgressBar*>& bars);
     void createSettingsWindow();
-    // lblConfig's caption and tip, kept until the settings window exists.
+    // The settings window's status line, kept until the window exists.
     void showConfigCaption(const QString& text, const QString& tip);
-    // The bars that follow the list's colours and picture: the refresh's progress bar and
-    // the settings window's slider bars.
-    std::vector<vbalProgressBar*> progressBars() const;
     void mnuAboutz26Readme_Click();
     void mnuAboutCopying_Click();
     void mnuAboutz26HomePage_Click();
@@ -129,26 +124,12 @@ private:
     // The selected row's full path, or the empty text when no row is selected.
     QString selectedRowPath() const;
 
-    struct RomFolderListing {
-        QString folder;
-        NameList names;
-    };
-    // The enabled ROM folders, in their stored order.
-    QStringList enabledRomFolders() const;
-    void startFirstListing();
-    // The listing started with the window, when it was made for these folders and this
-    // pattern; otherwise nothing. Either way it is used up.
-    std::vector<RomFolderListing> takeFirstListing(const QStringList& folders,
-                                                   const QString& pattern);
-
     Platform& m_platform;
     std::unique_ptr<frmSettings> m_settings;
-    // Default.lum as read at start-up, applied when the settings window is built.
-    std::unique_ptr<ConfigDecode> m_defaultOptionSet;
+    // Default.lum as read at start-up, shown when the settings window is built.
+    std::optional<EmulatorOptions> m_startOptions;
     std::optional<std::pair<QString, QString>> m_configCaption;
-    std::future<std::vector<RomFolderListing>> m_firstListing;
-    QStringList m_firstListingFolders;
-    QString m_firstListingPattern;
+    RomCatalogue m_catalogue;
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;

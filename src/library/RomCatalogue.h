@@ -1,0 +1,60 @@
+#pragma once
+
+#include "library/NameList.h"
+
+#include <QString>
+#include <QStringList>
+
+#include <functional>
+#include <future>
+#include <vector>
+
+// The rows of a refresh: row i is names[i], found in folders[rowFolders[i]].
+struct RomRows {
+    QStringList folders;
+    NameList names;
+    std::vector<int> rowFolders;
+    // Every name the folders listed, matched or not.
+    qint64 listed = 0;
+};
+
+// How far a refresh is: `done` of `total` names looked at.
+using RefreshProgress = std::function<void(qint64 done, qint64 total)>;
+
+// The ROM list's source: lists the enabled ROM folders with the file pattern and keeps the
+// names a search matches.
+class RomCatalogue {
+public:
+    RomCatalogue() = default;
+    RomCatalogue(const RomCatalogue&) = delete;
+    RomCatalogue& operator=(const RomCatalogue&) = delete;
+    ~RomCatalogue();
+
+    // Starts listing the folders on another thread, so that a large collection is listed
+    // while the window is built; the next refresh takes the listing over when it is for
+    // the same folders and pattern.
+    void prefetch(const QStringList& folders, const QString& pattern);
+    // Forgets a listing no refresh will take.
+    void dropPrefetch();
+
+    // Lists each folder once and keeps the names the search matches, all of them for an
+    // empty search. `progress` is called with done 0 once every folder is listed, then at
+    // least every thousandth of the names, and last with done equal to total.
+    RomRows refresh(const QStringList& folders, const QString& pattern, const QString& search,
+                    const RefreshProgress& progress);
+
+private:
+    struct Listing {
+        QString folder;
+        NameList names;
+    };
+    std::vector<Listing> takePrefetch(const QStringList& folders, const QString& pattern);
+
+    std::future<std::vector<Listing>> m_prefetch;
+    QStringList m_prefetchFolders;
+    QString m_prefetchPattern;
+};
+
+// The main window's caption after a refresh: the first load counts the ROMs found, a
+// refresh by the user the matches out of everything listed.
+QString refreshCaption(bool bFirstLoad, int rows, qint64 listed);
