@@ -222,44 +222,22 @@ template <typename T> void vbalProgressBar::assign(T& member, const T& value) {
     if (member == value)
         return;
     member = value;
-    ++m_epoch;
     redraw();
 }
 
 void vbalProgressBar::assignRange(int& member, int value) {
     if (member == value)
         return;
-    const bool known = memoCurrent();
-    if (known && &member == &m_value && m_barMemo.low <= value && value <= m_barMemo.high) {
-        m_value = value; // the same bar
-        return;
-    }
-    const QRect before = known ? m_barMemo.bar : currentBar();
-    member = value;
-    rememberBar();
     // Value, Min and Max show only through the bar's extent.
-    if (m_barMemo.bar != before)
+    const QRect before = currentBar();
+    member = value;
+    if (currentBar() != before)
         redraw();
 }
 
-void vbalProgressBar::rememberBar() {
-    const QRect track = this->track();
-    const bool across = horizontal();
-    const int step = barStep();
-    const auto barAt = [&](int value) {
-        return progressbar::barRect(track, progressbar::fraction(value, m_min, m_max), across,
-                                    step);
-    };
-    const QRect bar = barAt(m_value);
-    const auto drawsBar = [&](int value) { return barAt(value) == bar; };
-    m_barMemo = {m_epoch, size(), progressbar::runEnd(m_value, -1, drawsBar),
-                 progressbar::runEnd(m_value, +1, drawsBar), bar};
-}
-
 void vbalProgressBar::redraw() {
-    // A long operation may change the picture thousands of times a second without going
-    // back to the event loop. The eye needs no more than a frame every 16 ms, so between
-    // frames the change is only queued; the operation does not wait on the screen.
+    // A long operation that never returns to the event loop would otherwise repaint on
+    // every visible change; a frame every 16 ms is all the eye sees, the rest is queued.
     constexpr qint64 kFrameMs = 16;
     if (m_lastRepaint.isValid() && m_lastRepaint.elapsed() < kFrameMs) {
         update();
@@ -335,7 +313,6 @@ void vbalProgressBar::setBarPicture(const QImage& picture) {
     if (picture.cacheKey() == m_bar.picture.cacheKey())
         return;
     m_bar.set(picture);
-    ++m_epoch;
     redraw();
 }
 
@@ -343,7 +320,6 @@ void vbalProgressBar::setPicture(const QImage& picture) {
     if (picture.cacheKey() == m_back.picture.cacheKey())
         return;
     m_back.set(picture);
-    ++m_epoch; // a background picture turns the themed look off
     redraw();
 }
 
@@ -354,7 +330,6 @@ void vbalProgressBar::ModifyBarPicture(double fLuminance, double fSaturation) {
 
 void vbalProgressBar::ModifyPicture(double fLuminance, double fSaturation) {
     m_back.modify(fLuminance, fSaturation);
-    ++m_epoch;
     update();
 }
 
@@ -532,7 +507,6 @@ void vbalProgressBar::changeEvent(QEvent* event) {
     case QEvent::StyleChange:
     case QEvent::PaletteChange:
         m_themedTrackFor = QSize();
-        ++m_epoch;
         m_groove = QImage();
         update();
         break;

@@ -8,9 +8,6 @@
 #include <QString>
 #include <QWidget>
 
-#include <cstdint>
-#include <limits>
-
 class QPainter;
 class QStyleOptionProgressBar;
 
@@ -39,29 +36,6 @@ QList<QRect> gapStrips(const QRect& bar, const QRect& inner, bool horizontal, in
 // the first pixel column is Min, the last Max; beyond either end it is held there.
 int valueAt(double x, int left, int width, int min, int max);
 
-// The last value from `from` on, stepping by `direction` (+1 or -1), for which same(value)
-// holds, when it holds for one unbroken run of values starting at `from`. It is found by
-// galloping and halving, so a run of a million values costs some forty calls.
-template <typename Same> int runEnd(int from, int direction, const Same& same) {
-    const auto holds = [&](long long value) {
-        return value >= std::numeric_limits<int>::min() &&
-               value <= std::numeric_limits<int>::max() && same(static_cast<int>(value));
-    };
-    long long good = from;
-    long long bad = good;
-    for (long long jump = 1;; jump *= 2) {
-        bad = good + direction * jump;
-        if (!holds(bad))
-            break;
-        good = bad;
-    }
-    while (bad - good > 1 || good - bad > 1) {
-        const long long mid = good + (bad - good) / 2;
-        (holds(mid) ? good : bad) = mid;
-    }
-    return static_cast<int>(good);
-}
-
 } // namespace progressbar
 
 // A progress bar that draws itself: background colour or picture, a bar of colour or
@@ -70,9 +44,9 @@ template <typename Same> int runEnd(int from, int direction, const Same& same) {
 // than high for a horizontal bar growing to the right, otherwise vertical, growing upwards.
 // In interactive mode the user sets Value by dragging with the left button.
 //
-// Every property set that changes the drawn picture repaints at once, so a long operation
-// that never returns to the event loop still shows its progress; a set that changes
-// nothing visible (the bar's end stays on the same pixel) costs next to nothing.
+// Every property set that changes the drawn picture repaints at once (at most once a
+// frame), so a long operation that never returns to the event loop still shows its
+// progress; a set that leaves every pixel as it was does not repaint.
 // Colours are OLE colour numbers (ui/OleColor.h).
 class vbalProgressBar : public QWidget {
     Q_OBJECT
@@ -203,20 +177,6 @@ private:
     PictureHolder m_bar;
     pcMemDC m_memDC;
     QElapsedTimer m_lastRepaint;
-    // The bar's extent only ever grows (or only ever shrinks) as Value moves one way, so
-    // the Values that draw the same bar form one span. It is remembered until the size or
-    // any other property changes (each such change moves the epoch on), so that a long
-    // operation setting Value once per item mostly finds the picture unchanged at once.
-    struct BarMemo {
-        std::uint64_t epoch = ~std::uint64_t{0};
-        QSize size;
-        int low = 1, high = 0; // the span of Values, around Value itself
-        QRect bar;
-    };
-    bool memoCurrent() const { return m_barMemo.epoch == m_epoch && m_barMemo.size == size(); }
-    void rememberBar();
-    BarMemo m_barMemo;
-    std::uint64_t m_epoch = 0;
     // The style's contents area is asked for once per size and style, not once per Value.
     mutable QRect m_themedTrack;
     mutable QSize m_themedTrackFor;
