@@ -2,7 +2,7 @@
 
 #include "platform/Dialogs.h"
 #include "platform/Platform.h"
-#include "platform/SettingsStore.h"
+#include "platform/StoredSettings.h"
 #include "settings/PictureFit.h"
 #include "ui/Twips.h"
 
@@ -16,8 +16,6 @@
 #include <cmath>
 
 namespace {
-
-const QString kPicpos = QStringLiteral("picpos");
 
 // The picture in the file, or a null pixmap when there is none to be had.
 QPixmap loadPicture(const QString& path) {
@@ -52,13 +50,9 @@ frmPicPreview::frmPicPreview(Platform& platform, QWidget* owner)
     if (owner)
         setWindowIcon(owner->window()->windowIcon());
 
-    const SettingsStore& store = m_platform.store;
-    const double height = readSingle(store, kPicpos, QStringLiteral("height"), 5655);
-    const double width = readSingle(store, kPicpos, QStringLiteral("width"), 11115);
-    const double top = readSingle(store, kPicpos, QStringLiteral("top"), 300);
-    const double left = readSingle(store, kPicpos, QStringLiteral("left"), 300);
-    resize(std::max(1, twips::toPixelsX(width)), std::max(1, twips::toPixelsY(height)));
-    move(twips::toPixelsX(left), twips::toPixelsY(top));
+    const WindowPlace place = read(m_platform.store, stored::pictureWindow);
+    resize(std::max(1, twips::toPixelsX(place.width)), std::max(1, twips::toPixelsY(place.height)));
+    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
 }
 
 bool frmPicPreview::showPicture(const QString& path, const QString& caption) {
@@ -134,9 +128,7 @@ void frmPicPreview::saveGeometryToStore() {
     // A minimized window has no place worth keeping.
     if (isMinimized())
         return;
-    SettingsStore& store = m_platform.store;
-    store.SaveSetting(kPicpos, QStringLiteral("top"), singleText(twips::fromPixelsY(y())));
-    store.SaveSetting(kPicpos, QStringLiteral("left"), singleText(twips::fromPixelsX(x())));
-    store.SaveSetting(kPicpos, QStringLiteral("height"), singleText(twips::fromPixelsY(height())));
-    store.SaveSetting(kPicpos, QStringLiteral("width"), singleText(twips::fromPixelsX(width())));
+    write(m_platform.store, stored::pictureWindow,
+          {twips::fromPixelsY(y()), twips::fromPixelsX(x()), twips::fromPixelsX(width()),
+           twips::fromPixelsY(height())});
 }

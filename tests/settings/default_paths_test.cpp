@@ -1,0 +1,250 @@
+#include "SettingsFixture.h"
+
+#include "settings/DefaultPaths.h"
+
+#include <QAction>
+#include <QDir>
+#include <QLineEdit>
+#include <QMenu>
+#include <QPushButton>
+#include <QTabBar>
+#include <QTabWidget>
+#include <QTest>
+#include <QTreeWidget>
+
+namespace {
+
+class DefaultPaths : public SettingsFixture {
+protected:
+    static QTreeWidget* list(const frmSettings& w) {
+        return control<QTreeWidget>(w, "vbalListDefPaths");
+    }
+
+    // The folder list's rows as "path count on|off".
+    static QStringList rows(const frmSettings& w) {
+        QStringList texts;
+        for (int i = 0; i < list(w)->topLevelItemCount(); ++i) {
+            const QTreeWidgetItem* row = list(w)->topLevelItem(i);
+            texts << row->text(0) + " " + row->text(1) +
+                         (row->checkState(0) == Qt::Checked ? " on" : " off");
+        }
+        return texts;
+    }
+
+    // -1 selects no row.
+    static void selectRow(const frmSettings& w, int index) {
+        list(w)->setCurrentItem(index < 0 ? nullptr : list(w)->topLevelItem(index));
+    }
+};
+
+} // namespace
+
+TEST(DefaultPathsRules, ArchiveNamesAndTheEmulatorsPath) {
+    for (const char* archive : {"x.rar", "X.RAR", "/roms/Games.Rar"})
+        EXPECT_TRUE(isArchiveName(QString::fromUtf8(archive))) << archive;
+    for (const char* other : {".rar", "xrar", "", "x.rar.zip", "/roms/rar"})
+        EXPECT_FALSE(isArchiveName(QString::fromUtf8(other))) << other;
+
+    FakePlatform fake;
+    const QString emu = fake.makeFolder("emu");
+    const QString named = fake.makeFolder("z26");
+    // A folder called z26 holds the emulator; it is no emulator itself.
+    const QString completed[][2] = {{emu, emu + "/z26"},
+                                    {emu + "//", emu + "/z26"},
+                                    {emu + "/Z26", emu + "/Z26"},
+                                    {"/opt/xz26", "/opt/xz26/z26"},
+                                    {named, named + "/z26"}};
+    for (const auto& [path, expected] : completed)
+        EXPECT_EQ(completeZ26Path(path), expected) << qPrintable(path);
+
+    // The box shows the stored path trimmed, and completed once it is as long as "/z26".
+    const char* const shown[][2] = {{"  /opt/lum  ", "/opt/lum/z26"},
+                                    {"/opt/lum/Z26", "/opt/lum/Z26"},
+                                    {"/ab", "/ab"},
+                                    {"/abc", "/abc/z26"},
+                                    {"   ", ""}};
+    for (const auto& [text, expected] : shown)
+        EXPECT_EQ(z26PathForDisplay(QString::fromUtf8(text)), QString::fromUtf8(expected)) << text;
+}
+
+TEST_F(DefaultPaths, FoldersGoneFromDiskAreDroppedFromTheStoreAtOnce) {
+    const QString b = romFolder("b");
+    const QString c = romFolder("c");
+    storeFolder(1, b, true);
+    EXPECT_EQ(loadExistingRomFolders(fake.store), (std::vector<RomFolder>{{b, true}}));
+    EXPECT_EQ(stored("ROM2Path"), "<missing>"); // nothing is written while every folder exists
+
+    storeFolder(1, fake.root() + "/gone", true);
+    storeFolder(2, fake.writeFile("file.bin"), true); // a file where a folder belongs
+    storeFolder(3, b, false);
+    storeFolder(4, c, true);
+    const std::vector<RomFolder> expected = {{b, false}, {c, true}};
+    EXPECT_EQ(loadExistingRomFolders(fake.store), expected);
+    // Closed up at once, so the main list still reaches b and c.
+    EXPECT_EQ(readRomFolders(*fake.reopenStore()), expected);
+    EXPECT_EQ(stored("ROM3Path"), "");
+}
+
+// Counting lists every folder, so a window still hidden counts when it is shown.
+TEST_F(DefaultPaths, ThePageCountsExistingFoldersWithThePatternAndReloadsOnItsTab) {
+    fake.store.SaveSetting("Settings", "ROMFilter", "*.a26");
+    const QString a = romFolder("a", {"x.a26", "y.a26", "z.bin"});
+    const QString b = romFolder("b with blank", {"1.bin"});
+    storeFolder(1, a, false);
+    storeFolder(2, fake.root() + "/gone", true);
+    storeFolder(3, b, true);
+    auto w = std::make_unique<frmSettings>(fake.platform);
+    EXPECT_EQ(rows(*w), QStringList({a + "  off", b + "  on"}));
+    w->show();
+    EXPECT_EQ(rows(*w), QStringList({a + " 2 off", b + " 0 on"}));
+    auto* filter = control<QLineEdit>(*w, "txtDefPathFilter");
+
+    // A new pattern recounts every row and is stored at once.
+    filter->selectAll();
+    QTest::keyClicks(filter, "*.bin");
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", b + " 1 on"}));
+    EXPECT_EQ(stored("ROMFilter"), "*.bin");
+
+    // Choosing the page reads the store again, also by a click on the tab already shown.
+    QDir(a).removeRecursively();
+    w->selectPage("DefaultPaths");
+    EXPECT_EQ(rows(*w), QStringList({b + " 1 on"}));
+    storeFolder(2, romFolder("a", {"1.bin"}), true);
+    QTabBar* bar = control<QTabWidget>(*w, "vbalDTabControl1")->tabBar();
+    QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(bar->currentIndex()).center());
+    EXPECT_EQ(rows(*w), QStringList({b + " 1 on", a + " 1 on"}));
+}
+
+TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
+    const QString a = romFolder("a", {"1.bin"});
+    const QString b = romFolder("b", {"1.bin", "2.bin"});
+    auto w = open();
+    QWidget* target = list(*w)->viewport();
+    auto* add = control<QAction>(*w, "mnuROMSAdd");
+    add->trigger(); // cancelled
+    EXPECT_EQ(fake.dialogs.folderTitles, QStringList({"Choose ROMs path"}));
+    fake.dialogs.paths = {a};
+    add->trigger();
+    w->AddRomFolder(a, false); // the same folder twice: two rows, two entries
+    drop(target, {QUrl::fromLocalFile(b), QUrl::fromLocalFile(a)}); // only the first counts
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 on", a + " 1 on", b + " 2 on"}));
+    EXPECT_EQ(stored("ROM3Path"), b);
+
+    // Drops without a local item are ignored, on the list and on the emulator's box.
+    for (QWidget* onto : {target, static_cast<QWidget*>(control<QLineEdit>(*w, "txtDefPathz26"))})
+        for (const QList<QUrl>& urls : {QList<QUrl>{}, QList<QUrl>{QUrl("ftp://example.org/z26")}})
+            drop(onto, urls);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(stored("Z26Path"), "<missing>");
+
+    // A name ending in .rar is refused as an archive, even when it is a folder.
+    w->AddRomFolder(fake.writeFile("game.bin"), false);
+    drop(target, {QUrl::fromLocalFile(fake.root() + "/missing")});
+    drop(target, {QUrl::fromLocalFile(romFolder("games.RAR"))});
+    const std::string notAFolder = "Add Folders Not Files. | That doesn't appear to be a valid "
+                                   "folder.\nChoose another one. | Ok | None";
+    EXPECT_EQ(boxLines(fake.dialogs),
+              (Lines{notAFolder, notAFolder, "lum | .rar files aren't supported yet | Ok | None"}));
+    EXPECT_EQ(rows(*w).size(), 3);
+}
+
+TEST_F(DefaultPaths, TheListsKeysAndMenuFlipRefreshAndRemoveFolders) {
+    const QString a = romFolder("a", {"1.bin"});
+    const QString b = romFolder("b");
+    storeFolder(1, a, true);
+    storeFolder(2, b, true);
+    auto w = open();
+    QTreeWidget* paths = list(*w);
+    // Enter flips the selected folder and stores it at once, for the main list's next refresh.
+    QTest::keyClick(paths, Qt::Key_Return); // no selected row: nothing
+    selectRow(*w, 1);
+    QTest::keyClick(paths, Qt::Key_Return);
+    EXPECT_EQ(stored("ROM2Checked"), "False");
+    selectRow(*w, 0);
+    QTest::keyClick(paths, Qt::Key_Enter);
+    EXPECT_EQ(stored("ROMChecked"), "False");
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", b + " 0 off"}));
+
+    fake.writeFile("a/2.bin");
+    QTest::keyClick(paths, Qt::Key_F5);
+    EXPECT_EQ(rows(*w)[0], a + " 2 off");
+    fake.writeFile("a/3.bin");
+    control<QAction>(*w, "mnuROMSRefresh")->trigger();
+    EXPECT_EQ(rows(*w)[0], a + " 3 off");
+
+    // The right button's menu offers Remove only for a selected row.
+    auto* menu = control<QMenu>(*w, "mnuROMSPopup");
+    auto* remove = control<QAction>(*w, "mnuROMSRemove");
+    for (const int row : {0, -1}) {
+        selectRow(*w, row);
+        emit paths->customContextMenuRequested(QPoint(5, 5));
+        EXPECT_TRUE(menu->isVisible());
+        EXPECT_EQ(remove->isVisible(), row == 0);
+        menu->close();
+    }
+
+    // Remove asks first, and only Yes removes.
+    QTest::keyClick(paths, Qt::Key_Delete); // no selected row: nothing
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    selectRow(*w, 0);
+    fake.dialogs.answers = {MsgResult::No, MsgResult::Cancel, MsgResult::Yes};
+    QTest::keyClick(paths, Qt::Key_Delete);
+    remove->trigger();
+    EXPECT_EQ(rows(*w).size(), 2);
+    QTest::keyClick(paths, Qt::Key_Delete);
+    EXPECT_EQ(boxLines(fake.dialogs), Lines(3, ("Remove Path? | Are you sure you want to remove " +
+                                                a + " from the list? | YesNoCancel | Question")
+                                                   .toStdString()));
+    EXPECT_EQ(rows(*w), QStringList({b + " 0 off"}));
+    EXPECT_EQ(QStringList({stored("ROMPath"), stored("ROMChecked"), stored("ROM2Path")}),
+              QStringList({b, "False", ""}));
+    // Removing the only folder leaves no ROM path at all.
+    selectRow(*w, 0);
+    remove->trigger();
+    EXPECT_EQ(stored("ROMPath"), "");
+}
+
+TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
+    const QString emu = fake.makeFolder("emu");
+    const QString executable = fake.writeFile("emu/z26");
+    const QString upper = fake.writeFile("other/Z26");
+    auto w = open();
+    auto* box = control<QLineEdit>(*w, "txtDefPathz26");
+    EXPECT_EQ(box->text(), fake.programFolder() + "/z26"); // until one is chosen
+
+    auto* choose = control<QPushButton>(*w, "cmdAddZ26Path");
+    choose->click(); // cancelled
+    ASSERT_EQ(fake.dialogs.fileRequests.size(), 1u);
+    const FileDialogRequest& r = fake.dialogs.fileRequests[0].request;
+    EXPECT_FALSE(fake.dialogs.fileRequests[0].save);
+    EXPECT_EQ(QStringList({r.title, r.filter, r.initialFolder, QString::number(r.filterIndex),
+                           QString::number(r.flags, 16)}),
+              QStringList({"Choose z26 path", "z26 executable (z26)|z26|All Files (*.*)|*.*",
+                           fake.programFolder(), "1", "1800"}));
+    EXPECT_EQ(stored("Z26Path"), "<missing>");
+
+    fake.dialogs.paths = {emu};
+    choose->click(); // a folder is completed
+    EXPECT_EQ(box->text(), executable);
+    EXPECT_EQ(stored("Z26Path"), executable);
+    QTest::keyClicks(box, "xyz"); // typing is ignored
+    EXPECT_EQ(box->text(), executable);
+    drop(box, {QUrl::fromLocalFile(upper), QUrl::fromLocalFile(emu)}); // the emulator, any case
+    EXPECT_EQ(box->text(), upper);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(control<QLineEdit>(*open(), "txtDefPathz26")->text(), upper);
+
+    // What does not lead to the emulator is refused, and the stored path kept.
+    // The third is a folder named like the emulator, holding another such folder.
+    const QString refused[] = {fake.root() + "/missing", fake.makeFolder("empty"),
+                               fake.makeFolder("trap/z26/z26").chopped(4),
+                               fake.writeFile("notes.txt", "hello"),
+                               fake.root() + "/bad\nname\x01/z26"};
+    for (const QString& path : refused)
+        drop(box, {QUrl::fromLocalFile(path)});
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines(std::size(refused), "Non-z26 Folder Chosen. | z26 doesn't "
+                                        "exist in that path. \nChoose another one. | Ok | None"));
+    EXPECT_EQ(box->text(), upper);
+    EXPECT_EQ(stored("Z26Path"), upper);
+}

@@ -1,0 +1,156 @@
+#include "SettingsFixture.h"
+#include "support/Files.h"
+#include "support/Unreadable.h"
+
+#include "settings/PictureFit.h"
+#include "settings/frmPicPreview.h"
+#include "ui/Twips.h"
+
+#include <QComboBox>
+#include <QLabel>
+#include <QPointer>
+#include <QPushButton>
+#include <QTest>
+
+#include <sys/stat.h>
+
+namespace {
+
+class PicturePreview : public SettingsFixture {
+protected:
+    // A JPEG of that size in the program folder.
+    QString picture(const QString& name, int width, int height) {
+        return fake.writeFile("program/" + name, encodedPicture(width, height, "JPG"));
+    }
+    static QRect place(const QWidget* w) { return QRect(w->pos(), w->size()); }
+    static std::string shown(const frmPicPreview* w) {
+        return (w->windowTitle() + " " + w->picturePath()).toStdString();
+    }
+    const std::string kError = "Error | Error loading pic | Ok | Exclamation";
+};
+
+} // namespace
+
+// What the window never asks for: its frame taken off, a start other than 0, no room.
+TEST(PicturePreviewFit, FramesStartsAndBoxesWithoutRoom) {
+    const struct {
+        QSizeF picture;
+        float height, width, top, left;
+        bool frame;
+        std::optional<PictureFit> fit;
+    } cases[] = {
+        // The first window size less its frame: 10990 x 5130 twips.
+        {{640, 480}, 5655, 11115, 0, 0, true, PictureFit{0, 2075, 6840, 5130}},
+        {{200, 100}, 1000, 1000, 10, 20, false, PictureFit{260, 20, 1000, 500}},
+        {{100, 200}, 1000, 1000, 10, 20, false, PictureFit{10, 270, 500, 1000}},
+        {{100, 100}, 400, 2000, 0, 0, true, PictureFit{0, 0, 0, 0}},
+        {{100, 100}, 2000, 125, 5, 6, true, PictureFit{5, 6, 0, 0}},
+        {{0, 100}, 500, 500, 0, 0, false, std::nullopt},
+        {{100, 0}, 500, 500, 0, 0, false, std::nullopt},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(FitPictureToBox(c.picture, c.height, c.width, c.frame, c.top, c.left), c.fit)
+            << "row " << &c - cases;
+}
+
+TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensInPlace) {
+    // A JPEG whose header claims 60000 x 60000, its data cut.
+    QByteArray huge = encodedPicture(8, 8, "JPG");
+    const qsizetype frame = huge.indexOf("\xFF\xC0");
+    huge = huge.left(frame + 40).replace(frame + 5, 4, "\xEA\x60\xEA\x60");
+    const QString fifo = fake.programFolder() + "/fifo.jpg";
+    ASSERT_EQ(::mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
+    const QString bad[] = {
+        fake.programFolder() + "/missing.jpg",
+        fake.writeFile("program/empty.jpg"),
+        fake.writeFile("program/cut.jpg", encodedPicture(64, 64, "JPG").left(100)),
+        fake.writeFile("program/huge.jpg", huge),
+        fake.writeFile("program/garbage.jpg", "\xFF\xD8junk"),
+        makeUnreadable(fake.programFolder() + "/locked.jpg", huge),
+        fake.makeFolder("program/folder.jpg"),
+        fifo,
+        fake.programFolder() + "/"}; // a caption that names no layout
+    QPointer<frmPicPreview> preview = new frmPicPreview(fake.platform);
+    EXPECT_EQ(place(preview), QRect(twips::toPixelsX(300), twips::toPixelsY(300),
+                                    twips::toPixelsX(11115), twips::toPixelsY(5655)));
+    for (const QString& path : bad)
+        EXPECT_FALSE(preview->showPicture(path, "Paddle Control Layout")) << qPrintable(path);
+    EXPECT_EQ(boxLines(fake.dialogs), Lines(std::size(bad), kError));
+    EXPECT_FALSE(preview->isVisible());
+
+    preview->resize(400, 300);
+    const struct {
+        QSize picture;
+        QRect image;
+    } cases[] = {{{400, 100}, {0, 100, 400, 100}}, // wider: the whole width
+                 {{100, 500}, {170, 0, 60, 300}},  // taller: the whole height
+                 {{800, 600}, {0, 0, 400, 300}}};
+    for (const auto& c : cases) {
+        const QString path = picture("a.jpg", c.picture.width(), c.picture.height());
+        ASSERT_TRUE(preview->showPicture(path, "Paddle Control Layout"));
+        EXPECT_EQ(preview->PPImg->geometry(), c.image);
+    }
+    EXPECT_TRUE(preview->PPImg->isVisible() && !preview->PPPic->isVisible());
+    preview->resize(600, 300);
+    QCoreApplication::processEvents();
+    EXPECT_EQ(preview->PPImg->geometry(), QRect(100, 0, 400, 300));
+
+    // A bad picture leaves the open window as it was, and says so.
+    EXPECT_FALSE(preview->showPicture(bad[1], "Keyboard Control Layout"));
+    EXPECT_EQ(shown(preview),
+              "Paddle Control Layout " + fake.programFolder().toStdString() + "/a.jpg");
+    EXPECT_EQ(preview->PPPic->size(), QSize(800, 600));
+    EXPECT_EQ(fake.dialogs.boxes.size(), std::size(bad) + 1);
+    // Minimized, it leaves the picture where it was.
+    preview->setWindowState(Qt::WindowMinimized);
+    ASSERT_TRUE(preview->showPicture(picture("b.jpg", 400, 100), "Paddle Control Layout"));
+    EXPECT_EQ(preview->PPImg->geometry(), QRect(100, 0, 400, 300));
+    preview->setWindowState(Qt::WindowNoState);
+
+    preview->move(twips::toPixelsX(900), twips::toPixelsY(600));
+    QCoreApplication::processEvents();
+    const QRect placed = place(preview);
+    preview->close();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    EXPECT_TRUE(preview.isNull()) << "a closed preview is gone until the next click";
+    const frmPicPreview again(fake.platform);
+    EXPECT_EQ(place(&again), placed);
+}
+
+TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {
+    // A later word of the list wins, wherever it stands in the caption.
+    const std::pair<const char*, const char*> names[] = {
+        {"Standard Control Layout", "/lum Standard.jpg"},
+        {"DRIVING or paddle", "/lum Driving.jpg"},
+        {"keyboard standard", "/lum Keyboard.jpg"},
+        {"Joystick", ""}};
+    for (const auto& [caption, name] : names)
+        EXPECT_EQ(frmSettings::GetPicName(caption), name) << caption;
+
+    auto w = open();
+    auto* left = control<QPushButton>(*w, "cmdLeftControlPic");
+    auto* right = control<QPushButton>(*w, "cmdRightControlPic");
+    left->click(); // no picture file yet
+    EXPECT_EQ(boxLines(fake.dialogs), Lines{kError});
+    picture("lum Paddles.jpg", 40, 20);
+    picture("lum Driving.jpg", 40, 20);
+    control<QComboBox>(*w, "comboLeftController")->setCurrentIndex(2);  // Paddle Controller
+    control<QComboBox>(*w, "comboRightController")->setCurrentIndex(4); // Driving Controller
+    EXPECT_EQ(left->text() + ", " + right->text(), "Paddle Control Layout, Driving Control Layout");
+    const std::string folder = fake.programFolder().toStdString();
+    QTest::mouseClick(left, Qt::LeftButton);
+    const QPointer<frmPicPreview> preview = w->findChild<frmPicPreview*>();
+    ASSERT_TRUE(preview && preview->isVisible() && preview->isWindow());
+    EXPECT_EQ(shown(preview), "Paddle Control Layout " + folder + "/lum Paddles.jpg");
+    // A click while it is open shows the other picture in the same window.
+    QTest::mouseClick(right, Qt::LeftButton);
+    EXPECT_EQ(w->findChildren<frmPicPreview*>(), QList<frmPicPreview*>{preview});
+    EXPECT_EQ(shown(preview), "Driving Control Layout " + folder + "/lum Driving.jpg");
+    // Once closed, the next click opens a new one.
+    preview->close();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    QTest::mouseClick(left, Qt::LeftButton);
+    const frmPicPreview* next = w->findChild<frmPicPreview*>();
+    EXPECT_TRUE(next && next->isVisible());
+    EXPECT_EQ(fake.dialogs.boxes.size(), 1u);
+}
