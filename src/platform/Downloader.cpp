@@ -34,27 +34,34 @@ bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename
 
     QNetworkReply* reply = m_manager->get(request);
     bool writeFailed = false;
+    qint64 written = 0;
+    const auto store = [&](const QByteArray& chunk) {
+        if (!writeFailed && target.write(chunk) != chunk.size())
+            writeFailed = true;
+        written += chunk.size();
+    };
     QEventLoop loop;
     QObject::connect(reply, &QNetworkReply::readyRead, &loop, [&] {
-        const QByteArray chunk = reply->readAll();
-        if (!writeFailed && target.write(chunk) != chunk.size()) {
-            writeFailed = true;
+        store(reply->readAll());
+        if (writeFailed)
             reply->abort();
-        }
     });
     QObject::connect(reply, &QNetworkReply::finished, &loop, &QEventLoop::quit);
     if (!reply->isFinished())
         loop.exec(QEventLoop::ExcludeUserInputEvents);
 
-    if (reply->isOpen()) {
-        const QByteArray rest = reply->readAll();
-        if (!writeFailed && target.write(rest) != rest.size())
-            writeFailed = true;
-    }
+    if (reply->isOpen())
+        store(reply->readAll());
 
+    // A body the server cut off is not always reported as an error; the length it announced
+    // tells. (A compressed body is announced at its compressed length, so it cannot be told.)
+    const QVariant announced = reply->header(QNetworkRequest::ContentLengthHeader);
+    const QByteArray encoding = reply->rawHeader("Content-Encoding");
+    const bool bWhole = !announced.isValid() || !(encoding.isEmpty() || encoding == "identity") ||
+                        written == announced.toLongLong();
     const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
-    const bool ok =
-        !writeFailed && reply->error() == QNetworkReply::NoError && status >= 200 && status < 300;
+    const bool ok = !writeFailed && bWhole && reply->error() == QNetworkReply::NoError &&
+                    status >= 200 && status < 300;
     reply->deleteLater();
     if (!ok) {
         target.cancelWriting();

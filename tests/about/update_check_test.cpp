@@ -1,21 +1,28 @@
 #include "support/Boxes.h"
+#include "support/DiskFull.h"
 #include "support/Files.h"
 #include "support/LocalHttpServer.h"
+#include "support/Unreadable.h"
 
 #include "about/UpdateCheck.h"
 
-#include <QDir>
-#include <QFileInfo>
+#include <QDirIterator>
+
+#include <optional>
 
 #include <gtest/gtest.h>
 
 namespace {
 
-const QString kDescription = QStringLiteral("/programs/update.txt");
 const QString kInstaller = QStringLiteral("/files/setup.run");
 const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
 const std::string kAsk = "Update available | Version 1.1.13 released June 2nd is available.\n\n"
                          "Do you wish to update now? | YesNoCancel | None";
+const std::string kFailedCheck = "Update Check Failed | ";
+
+LocalHttpServer::Response reply(const QByteArray& body, int status = 200) {
+    return {status, body, {}, false, -1};
+}
 
 class UpdateCheckTest : public ::testing::Test {
 protected:
@@ -23,137 +30,163 @@ protected:
     LocalHttpServer server;
 
     // A description file with this product's section after another product's.
-    void describe(qint64 version, const QByteArray& fileName = "setup.run",
-                  const QByteArray& runFlag = "0", const QByteArray& messages = {}) {
-        server.serve(kDescription, "::Other\r\nhttps://other.example/forum\r\n9999999\r\n" +
-                                       kHeader + "https://example.org/forum/lum\r\n" + messages +
-                                       QByteArray::number(version) + "\r\nJune 2nd\r\n" +
-                                       server.base().toUtf8() + kInstaller.toUtf8() + "\r\n" +
-                                       fileName + "\r\n" + runFlag + "\r\n");
-        server.serve(kInstaller, "INSTALLER");
+    QByteArray section(const QByteArray& version, const QByteArray& messages = {},
+                       const QByteArray& fileName = "setup.run", const QByteArray& run = "0") {
+        return "::Other\r\nhttps://other.example/forum\r\n9999999\r\n" + kHeader +
+               "https://example.org/forum/lum\r\n" + messages + version + "\r\nJune 2nd\r\n" +
+               server.base().toUtf8() + kInstaller.toUtf8() + "\r\n" + fileName + "\r\n" + run +
+               "\r\n";
     }
-
-    UpdateCheck::Outcome run(bool forum) {
-        return UpdateCheck(fake.platform, nullptr, server.base()).Run(forum);
-    }
-
-    // The boxes shown since the last call.
-    Lines takeBoxes() {
+    // Runs a check on `description` (an empty one is not found on the server) and returns
+    // what it did, one line each: boxes, pages and folders opened, programs started. A box
+    // that is not scripted answers with its first button.
+    Lines run(bool forum, const QByteArray& description, std::deque<MsgResult> answers = {}) {
+        if (description.isEmpty())
+            server.fail("/programs/update.txt", 404);
+        else
+            server.serve("/programs/update.txt", description);
+        fake.dialogs.answers = std::move(answers);
+        const auto outcome = UpdateCheck(fake.platform, nullptr, server.base()).Run(forum);
         Lines lines = boxLines(fake.dialogs);
+        for (const QString& url : fake.shell.urls)
+            lines.push_back("open " + url.toStdString());
+        for (const QString& folder : fake.shell.folders)
+            lines.push_back("show " + folder.toStdString());
+        for (const FakeShell::Start& start : fake.shell.started)
+            lines.push_back(
+                ("start " + start.program + u' ' + start.arguments.join(u' ')).toStdString());
+        if (outcome == UpdateCheck::Outcome::EndProgram)
+            lines.push_back("end program");
         fake.dialogs.boxes.clear();
+        fake.shell.urls.clear();
+        fake.shell.folders.clear();
+        fake.shell.started.clear();
         return lines;
     }
-
-    QString updateFolder() const { return fake.programFolder() + "/Update"; }
-    QString installerPath() const { return updateFolder() + "/setup.run"; }
+    // The program folder besides the description's local copy: "name=content" for a file,
+    // "name/" for a folder.
+    QString programFiles() const {
+        QStringList entries;
+        QDirIterator it(fake.programFolder(),
+                        QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot,
+                        QDirIterator::Subdirectories);
+        while (it.hasNext()) {
+            const QString name = it.next().mid(fake.programFolder().size() + 1);
+            if (it.fileInfo().isDir())
+                entries << name + u'/';
+            else if (name != u"tmp")
+                entries << name + u'=' + QString::fromUtf8(fileBytes(it.filePath()));
+        }
+        entries.sort();
+        return entries.join(u' ');
+    }
 };
 
-TEST_F(UpdateCheckTest, ForumModeOpensTheSectionsWebPageOnly) {
-    describe(1049613);
-    run(true);
-    // Something other than a web page is not opened; the general forum stands in.
-    server.serve(kDescription, kHeader + "file:///etc/passwd\r\n1049613\r\n");
-    run(true);
-    EXPECT_EQ(fake.shell.urls,
-              (QStringList{"https://example.org/forum/lum", server.base() + "/forum"}));
-    EXPECT_TRUE(takeBoxes().empty());
-    EXPECT_FALSE(server.requests.contains(kInstaller));
-}
+// Everything short of a download: nothing is fetched and nothing made but the local copy.
+TEST_F(UpdateCheckTest, WhatEachDescriptionLeadsTo) {
+    const std::string offline =
+        kFailedCheck + "Failed to connect to the internet | Ok | Information";
+    EXPECT_EQ(run(false, {}), Lines{offline});
+    EXPECT_EQ(run(true, {}), Lines{offline});
+    EXPECT_FALSE(QFileInfo::exists(fake.programFolder() + "/tmp"));
 
-TEST_F(UpdateCheckTest, VersionsAreComparedAndOnlyYesDownloads) {
-    describe(1049612, "setup.run", "0", "'Hello\r\n'World\r\n");
-    run(false);
-    EXPECT_EQ(takeBoxes(), (Lines{"Update Message | \nHello\nWorld\n | Ok | Information",
-                                  "No update needed | You have the current version 1.1.12 "
-                                  "Released June 2nd\nNo update is needed | Ok | None"}));
-    const struct {
-        qint64 available;
-        MsgResult answer;
-        std::string box;
-    } cases[] = {{1049611, MsgResult::Ok,
-                  "No update needed | Huh, that's odd... \nThis Version is newer that what's "
-                  "available\non the internet. | Ok | None"},
-                 {1049613, MsgResult::No, kAsk},
-                 {2098176, MsgResult::Cancel,
-                  "Update available | Version 2.1.0 released June 2nd is available.\n\n"
-                  "Do you wish to update now? | YesNoCancel | None"}};
-    for (const auto& c : cases) {
-        fake.dialogs.answers = {c.answer};
-        describe(c.available);
-        run(false);
-        EXPECT_EQ(takeBoxes(), Lines{c.box}) << c.available;
-    }
+    EXPECT_EQ(run(false, section("1049612", "'Hello\r\n'World\r\n")),
+              (Lines{"Update Message | \nHello\nWorld\n | Ok | Information",
+                     "No update needed | You have the current version 1.1.12 Released June 2nd\n"
+                     "No update is needed | Ok | None"}));
+    const std::string forum = "open " + server.base().toStdString() + "/forum";
+    const std::tuple<bool, QByteArray, MsgResult, std::string> rows[] = {
+        {true, kHeader + "file:///etc/passwd\r\n", MsgResult::Ok, forum}, // web pages only
+        {true, "::Other\r\n", MsgResult::Ok, forum},
+        {false, "::Other\r\n", MsgResult::Ok,
+         "No updates available | No Updates Found | Ok | None"},
+        {false, section("1049611"), MsgResult::Ok,
+         "No update needed | Huh, that's odd... \nThis Version is newer that what's available\n"
+         "on the internet. | Ok | None"},
+        {false, section("1049613"), MsgResult::No, kAsk},
+        {false, section("1049613"), MsgResult::Cancel, kAsk},
+        {false, kHeader + "f\r\n", MsgResult::Ok,
+         kFailedCheck + "The update information is incomplete. | Ok | Information"},
+        {false, kHeader + "f\r\n1.1.13\r\n", MsgResult::Ok,
+         kFailedCheck + "The update information holds no valid version. | Ok | Information"},
+        {false, section("1049613", {}, "../setup.run"), MsgResult::Yes,
+         kFailedCheck + "The update names an installer file that cannot be accepted: "
+                        "\"../setup.run\" | Ok | Information"},
+    };
+    for (const auto& [forumMode, description, answer, did] : rows)
+        EXPECT_EQ(run(forumMode, description, {answer}), Lines{did}) << description.toStdString();
     EXPECT_FALSE(server.requests.contains(kInstaller));
-    EXPECT_FALSE(QFileInfo::exists(updateFolder()));
-    // The local copy of the description stays in the program folder.
+    EXPECT_EQ(programFiles(), "");
     EXPECT_TRUE(fileBytes(fake.programFolder() + "/tmp").startsWith("::Other"));
 }
 
-TEST_F(UpdateCheckTest, DownloadAndKeepReplacingAnOlderInstaller) {
-    describe(1049613);
-    server.fail(kInstaller, 404);
-    run(false);
-    EXPECT_EQ(takeBoxes(),
-              (Lines{kAsk, "Download Failed | Failed to Download Update | Ok | None"}));
-    EXPECT_TRUE(QFileInfo(updateFolder()).isDir()); // made for the download, and kept
-    EXPECT_FALSE(QFileInfo::exists(installerPath()));
-
-    fake.writeFile("program/Update/setup.run", "OLD");
-    server.serve(kInstaller, "INSTALLER");
-    EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
-    EXPECT_EQ(fileBytes(installerPath()), "INSTALLER");
-    EXPECT_EQ(takeBoxes(),
-              (Lines{kAsk, "Download Complete | The update has been downloaded to " +
-                               QDir::toNativeSeparators(installerPath()).toStdString() +
-                               "\n | Ok | Information"}));
-    // The folder window shows the program folder, not Update.
-    EXPECT_EQ(fake.shell.folders, QStringList{fake.programFolder()});
-    EXPECT_TRUE(fake.shell.started.empty());
-}
-
-TEST_F(UpdateCheckTest, DownloadAndRunEndsTheProgram) {
-    describe(1049613, "setup.run", "1");
-    EXPECT_EQ(run(false), UpdateCheck::Outcome::EndProgram);
-    EXPECT_TRUE(QFileInfo(installerPath()).isExecutable());
-    ASSERT_EQ(fake.shell.started.size(), 1u);
-    EXPECT_EQ(fake.shell.started[0].program, installerPath());
-    EXPECT_EQ(fake.shell.started[0].arguments,
-              (QStringList{"/SP-", "/silent", "/noicons",
-                           "/dir=" + QDir::toNativeSeparators(fake.programFolder())}));
-    EXPECT_EQ(takeBoxes(), Lines{kAsk});
-    EXPECT_TRUE(fake.shell.folders.empty());
-
-    // An installer that will not start leaves the program running and says where it is.
-    fake.shell.succeed = false;
-    EXPECT_EQ(run(false), UpdateCheck::Outcome::Finished);
-    EXPECT_EQ(takeBoxes().size(), 2u); // asked, then told where the installer is
-    EXPECT_EQ(fake.shell.folders, QStringList{fake.programFolder()});
-}
-
-TEST_F(UpdateCheckTest, AnUnreachableDescriptionIsAFailedCheckInBothModes) {
-    server.fail(kDescription, 404);
-    run(false);
-    run(true);
-    EXPECT_EQ(takeBoxes(),
-              Lines(2, "Update Check Failed | Failed to connect to the internet | Ok | "
-                       "Information"));
-    EXPECT_TRUE(fake.shell.urls.empty());
-    EXPECT_FALSE(QFileInfo::exists(fake.programFolder() + "/tmp"));
-}
-
-// An installer name that leads out of the Update folder is a failed check: nothing is asked
-// or fetched. (Broken sections are failed checks too: see bad_input_test.cpp.)
-TEST_F(UpdateCheckTest, UnsafeInstallerNames) {
-    for (const char* name : {"../evil.run", "/tmp/evil.run", ""}) {
-        describe(1049613, name);
-        run(false);
-        const Lines boxes = takeBoxes();
-        ASSERT_EQ(boxes.size(), 1u) << name;
-        EXPECT_TRUE(boxes[0].starts_with("Update Check Failed | ")) << boxes[0];
+// Run flag 0 keeps the installer and shows the program folder; run flag 1 starts it and
+// ends the program, unless it will not start. An installer that arrives empty or cannot be
+// stored is a failed download: nothing starts and the Update folder keeps what it held. A
+// local copy of the description that cannot be written is kept elsewhere.
+TEST_F(UpdateCheckTest, Downloads) {
+    enum Limit { None, WontStart, FullDisk, ReadOnlyUpdate, ReadOnlyProgram };
+    const QString program = fake.programFolder(), installer = program + "/Update/setup.run";
+    const std::string kept = "Download Complete | The update has been downloaded to " +
+                             QDir::toNativeSeparators(installer).toStdString() +
+                             "\n | Ok | Information";
+    const std::string show = "show " + program.toStdString();
+    const std::string start = (QStringLiteral("start ") + installer +
+                               " /SP- /silent /noicons /dir=" + QDir::toNativeSeparators(program))
+                                  .toStdString();
+    const std::string failed = "Download Failed | Failed to Download Update | Ok | None";
+    const QString old = "Update/setup.run=OLD", oldKept = "Update/ Update/setup.run=OLD",
+                  newKept = "Update/ Update/setup.run=NEW";
+    const struct {
+        QString before;
+        LocalHttpServer::Response response;
+        QByteArray runFlag;
+        Limit limit;
+        Lines did;
+        QString after;
+    } rows[] = {
+        {old, reply("NEW"), "0", None, {kAsk, kept, show}, newKept},
+        {old, reply("NEW"), "1", None, {kAsk, start, "end program"}, newKept},
+        {"", reply("NEW"), "1", WontStart, {kAsk, kept, show, start}, newKept},
+        {"tmp/keep=1", reply("NEW"), "0", None, {kAsk, kept, show}, newKept + " tmp/ tmp/keep=1"},
+        {"", reply({}, 404), "0", None, {kAsk, failed}, "Update/"}, // the folder made for it stays
+        {old, reply({}), "0", None, {kAsk, failed}, oldKept},
+        {old, reply(QByteArray(8192, 'x')), "0", FullDisk, {kAsk, failed}, oldKept},
+        {old, reply("NEW"), "0", ReadOnlyUpdate, {kAsk, failed}, oldKept},
+        {"", reply("NEW"), "0", ReadOnlyProgram, {kAsk, failed}, ""},
+        {"Update/setup.run/", reply("NEW"), "0", None, {kAsk, failed}, "Update/ Update/setup.run/"},
+        {"Update=file", reply("NEW"), "0", None, {kAsk, failed}, "Update=file"},
+    };
+    for (const auto& row : rows) {
+        for (const char* name : {"/Update", "/tmp"}) {
+            QDir(program + name).removeRecursively();
+            QFile::remove(program + name);
+        }
+        const qsizetype split = row.before.indexOf(u'=');
+        if (row.before.endsWith(u'/'))
+            fake.makeFolder("program/" + row.before);
+        else if (split > 0)
+            fake.writeFile("program/" + row.before.left(split), row.before.mid(split + 1).toUtf8());
+        server.responses[kInstaller] = row.response;
+        fake.shell.succeed = row.limit != WontStart;
+        const QString locked = row.limit == ReadOnlyUpdate ? program + "/Update" : program;
+        Lines did;
+        {
+            std::optional<DiskFull> full;
+            std::optional<NoPermissionOverride> asAnyone;
+            if (row.limit == FullDisk)
+                full.emplace(1024);
+            if (row.limit >= ReadOnlyUpdate) {
+                QFile::setPermissions(locked, QFile::ReadOwner | QFile::ExeOwner);
+                ASSERT_TRUE(asAnyone.emplace().holds());
+            }
+            did = run(false, section("1049613", {}, "setup.run", row.runFlag), {MsgResult::Yes});
+        }
+        QFile::setPermissions(locked, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+        EXPECT_EQ(did, row.did) << row.before.toStdString() << row.limit;
+        EXPECT_EQ(programFiles(), row.after) << row.before.toStdString() << row.limit;
+        EXPECT_TRUE(row.runFlag == "0" || QFileInfo(installer).isExecutable());
     }
-    EXPECT_FALSE(server.requests.contains(kInstaller));
-    EXPECT_FALSE(QFileInfo::exists(updateFolder()));
-    EXPECT_FALSE(QFileInfo::exists(fake.root() + "/evil.run"));
 }
 
 } // namespace

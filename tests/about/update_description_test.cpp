@@ -7,27 +7,33 @@
 namespace {
 
 const QString kProduct = QStringLiteral("lum (Windows Front End for z26)");
+const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
+const std::string kNone = "NotFound |  |  | 0 |  |  |  | ";
 
-// The section read from `content`; `end` receives how far the file was read.
-UpdateSection read(const QByteArray& content, bool forumOnly = false, qint64* end = nullptr) {
+// The section read from `content` as one line: status, then every field in file order.
+// `end` receives how far the file was read.
+std::string read(const QByteArray& content, bool forumOnly = false, qint64* end = nullptr) {
     QBuffer buffer;
     buffer.setData(content);
     buffer.open(QIODevice::ReadOnly);
-    UpdateSection section = readUpdateSection(buffer, kProduct, forumOnly);
+    const UpdateSection s = readUpdateSection(buffer, kProduct, forumOnly);
     if (end)
         *end = buffer.pos();
-    return section;
+    static const char* const statuses[] = {"NotFound", "Complete", "Truncated", "BadVersion"};
+    const QStringList fields = {s.forumUrl,    s.message,      QString::number(s.availableVersion),
+                                s.releaseDate, s.installerUrl, s.installerFileName,
+                                s.runFlag};
+    return statuses[static_cast<int>(s.status)] + (" | " + fields.join(" | ")).toStdString();
 }
 
 TEST(UpdateDescriptionTest, VersionArithmetic) {
-    EXPECT_EQ(thisProduct().name, kProduct);
-    EXPECT_EQ(versionNumber(thisProduct()), 1049612);
-    EXPECT_EQ(versionText(thisProduct()), "1.1.12");
-    // (1.1.13 and 2.1.0: see the update check's question.)
-    EXPECT_EQ(versionTextFromNumber(0), "0.0.0");
-    EXPECT_EQ(versionTextFromNumber(1048575), "0.1023.1023");
+    const std::pair<qint64, const char*> texts[] = {
+        {0, "0.0.0"}, {1048575, "0.1023.1023"}, {1049613, "1.1.13"}, {2098176, "2.1.0"}};
+    for (const auto& [number, text] : texts)
+        EXPECT_EQ(versionTextFromNumber(number), text) << number;
     EXPECT_EQ(parseVersionNumber(QStringLiteral(" 1049613\t")), 1049613);
-    for (const char* bad : {"", "1.1.13", "+5", "12abc", "1 2"})
+    for (const char* bad :
+         {"", "1.1.13", "+5", "-5", "12abc", "1 2", "99999999999999999999999", "\u0661\u0662"})
         EXPECT_FALSE(parseVersionNumber(QString::fromUtf8(bad))) << bad;
 }
 
@@ -47,46 +53,52 @@ TEST(UpdateDescriptionTest, HeadersAndInstallerNames) {
 }
 
 TEST(UpdateDescriptionTest, FindsTheSectionAndReadsNoFurther) {
-    const QByteArray file =
-        "\r\n::\r\nx\r\n"
-        "::LUM (WINDOWS FRONT END FOR Z26)\r\nhttps://wrong\r\n"
-        "::Other Program\r\nhttps://other\r\n2098176\r\n"
-        "::lum (Windows Front End for z26)\r\nhttps://example.org/forum/lum\r\n"
-        "1049613\r\nMay 1st\r\nhttps://example.org/setup.exe\r\nsetup.exe\r\n1\r\n"
-        "after the run flag\r\n";
-    qint64 end = 0;
-    const UpdateSection s = read(file, false, &end);
-    EXPECT_EQ(s.status, UpdateSection::Status::Complete);
-    EXPECT_EQ(QStringList({s.forumUrl, s.message, QString::number(s.availableVersion),
-                           s.releaseDate, s.installerUrl, s.installerFileName, s.runFlag}),
-              QStringList({"https://example.org/forum/lum", "", "1049613", "May 1st",
-                           "https://example.org/setup.exe", "setup.exe", "1"}));
-    EXPECT_EQ(end, file.indexOf("after"));
-    EXPECT_EQ(read(file, true, &end).status, UpdateSection::Status::Complete);
-    EXPECT_EQ(end, file.indexOf("1049613"));
-    for (const bool forum : {false, true})
-        EXPECT_EQ(read(file.left(file.indexOf("::lum")), forum).status,
-                  UpdateSection::Status::NotFound);
-}
+    const QByteArray file = "\r\n::\r\nx\r\n::LUM (WINDOWS FRONT END FOR Z26)\r\nhttps://wrong\r\n"
+                            "::Other Program\r\nhttps://other\r\n2098176\r\n" +
+                            kHeader +
+                            "https://example.org/forum/lum\r\n1049613\r\nMay 1st\r\n"
+                            "https://example.org/setup.exe\r\nsetup.exe\r\n1\r\nafter the flag\r\n";
+    QByteArray others, noise(64 * 1024, '\0');
+    while (others.size() < 8 * 1024 * 1024)
+        others += "::Some other product\r\nhttps://example.org/other\r\n'a message\r\n";
+    for (qsizetype i = 0; i < noise.size(); ++i)
+        noise[i] = static_cast<char>(i * 7919 % 251);
+    const std::tuple<QByteArray, bool, std::string, qsizetype> rows[] = {
+        {file, false,
+         "Complete | https://example.org/forum/lum |  | 1049613 | May 1st | "
+         "https://example.org/setup.exe | setup.exe | 1",
+         file.indexOf("after")},
+        {file, true, "Complete | https://example.org/forum/lum |  | 0 |  |  |  | ",
+         file.indexOf("1049613")},
+        {others + kHeader + "f\r\n1049612\r\nd\r\nu\r\nn\r\n0\r\n", false,
+         "Complete | f |  | 1049612 | d | u | n | 0", -1},
+        {"::lum (Windows Front End for z26)\nf\n'Hello\n'World\n1049613\nd\nu\nn\n0\n", false,
+         "Complete | f | \nHello\nWorld\n | 1049613 | d | u | n | 0", -1},
+        {kHeader + "f\r\n'note\r\n1.1.13\r\nd\r\n", false,
+         "BadVersion | f | \nnote\n | 0 |  |  |  | ", -1},
+    };
+    for (const auto& [content, forumOnly, section, stop] : rows) {
+        qint64 end = 0;
+        EXPECT_EQ(read(content, forumOnly, &end), section) << content.left(80).toStdString();
+        EXPECT_EQ(stop < 0 ? stop : end, stop);
+    }
+    // No section for this product: nothing, noise, one line of 8 MiB, a NUL after the name,
+    // other sections only.
+    const QByteArray none[] = {{},
+                               noise,
+                               QByteArray(8 * 1024 * 1024, 'x'),
+                               QByteArray("::lum (Windows Front End for z26)\0\r\n", 36),
+                               file.left(file.indexOf("::lum"))};
+    for (const QByteArray& content : none)
+        for (const bool forumOnly : {false, true})
+            EXPECT_EQ(read(content, forumOnly), kNone) << content.left(80).toStdString();
 
-TEST(UpdateDescriptionTest, MessagesCutShortOrWithoutANumber) {
-    // LF-only line ends are read as well.
-    const UpdateSection two =
-        read("::lum (Windows Front End for z26)\nf\n'Hello\n'World\n1049613\nd\nu\nn\n0\n");
-    EXPECT_EQ(two.status, UpdateSection::Status::Complete);
-    EXPECT_EQ(two.message, "\nHello\nWorld\n");
-    EXPECT_EQ(two.availableVersion, 1049613);
-
-    const QByteArray full = "::lum (Windows Front End for z26)\r\nf\r\n'note\r\n"
-                            "1049613\r\ndate\r\nurl\r\nname\r\n0\r\n";
+    // Cut after any line of the section, it is incomplete.
+    const QByteArray full = kHeader + "f\r\n'note\r\n1049613\r\ndate\r\nurl\r\nname\r\n0\r\n";
     for (qsizetype end = full.indexOf("\r\n"); end + 2 < full.size();
          end = full.indexOf("\r\n", end + 2))
-        EXPECT_EQ(read(full.left(end + 2)).status, UpdateSection::Status::Truncated) << end;
-    EXPECT_EQ(read(full.left(full.indexOf("\r\n") + 2), true).status,
-              UpdateSection::Status::Truncated);
-    QByteArray notANumber = full;
-    notANumber.replace("1049613", "1.1.13");
-    EXPECT_EQ(read(notANumber).status, UpdateSection::Status::BadVersion);
+        EXPECT_EQ(read(full.left(end + 2)).substr(0, 9), "Truncated") << end;
+    EXPECT_EQ(read(kHeader, true), "Truncated |  |  | 0 |  |  |  | ");
 }
 
 } // namespace

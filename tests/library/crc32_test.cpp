@@ -4,10 +4,11 @@
 #include "support/FakePlatform.h"
 #include "support/Unreadable.h"
 
-#include <QFile>
 #include <QFileInfo>
 
+#include <numeric>
 #include <random>
+#include <tuple>
 #include <vector>
 
 #include <sys/stat.h>
@@ -34,68 +35,85 @@ QByteArray randomBytes(std::mt19937& rng, qsizetype size) {
     return bytes;
 }
 
-class Crc32Test : public ::testing::Test {
-protected:
-    // Checksums a file holding `content`; records the progress values it reported.
-    qint32 crcOfFile(const QByteArray& content) {
-        m_crc.setInputFileName(m_fake.writeFile(QStringLiteral("rom.bin"), content));
-        m_progress.clear();
-        return m_crc.GetCRCFromFile();
-    }
-
-    FakePlatform m_fake;
-    CCRC32 m_crc{m_fake.dialogs};
-    std::vector<float> m_progress;
-
-    void SetUp() override {
-        QObject::connect(&m_crc, &CCRC32::Progress,
-                         [this](float fraction) { m_progress.push_back(fraction); });
-    }
-};
-
-TEST_F(Crc32Test, CheckValueComesBackAsTheNegativeNumberWithTheSameBits) {
-    const qint32 crc = crcOfFile("123456789");
-    EXPECT_EQ(crc, static_cast<qint32>(0xCBF43926u));
-    // Nothing carries over: the same file again gives the same value.
-    EXPECT_EQ(m_crc.GetCRCFromFile(), crc);
-    EXPECT_TRUE(m_fake.dialogs.boxes.empty());
-}
-
-// Sizes around the chunk boundaries: a remainder of up to 32,768 bytes is read whole, so
-// 32,768 is one chunk and 32,769 two (32,767 + 2). The progress values show the chunks.
-TEST_F(Crc32Test, FileSizesAroundTheChunkRuleGiveTheWholeFilesCrc) {
-    struct Case {
-        qsizetype size;
-        std::vector<qsizetype> chunks;
-    };
-    const std::vector<Case> cases = {
-        {0, {}},
-        {1, {1}},
-        {32767, {32767}},
-        {32768, {32768}},
-        {32769, {32767, 2}},
-        {65535, {32767, 32768}},
-        {65536, {32767, 32767, 2}},
-    };
+// A ROM file in every shape gives, call after call, the CRC of its bytes, read in chunks of
+// 32,767 but for a last piece of up to 32,768 (as the progress shows); or, unreadable, 0, no
+// progress and one box. A missing file is not created, and a FIFO does not hang the call.
+TEST(Crc32, EveryFileGivesTheCrcOfItsBytesOrZeroAndOneBox) {
+    FakePlatform fake;
+    CCRC32 crc(fake.dialogs);
+    std::vector<float> progress;
+    QObject::connect(&crc, &CCRC32::Progress, [&](float value) { progress.push_back(value); });
+    using Case = std::tuple<QString, quint32, std::vector<qsizetype>, const char*>;
     std::mt19937 rng(1);
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.size);
-        const QByteArray content = randomBytes(rng, c.size);
-        EXPECT_EQ(crcOfFile(content), static_cast<qint32>(referenceCrc(content)));
-
-        std::vector<float> expected = {0.0f};
+    const auto randomFile = [&](const std::vector<qsizetype>& chunks) {
+        const QByteArray bytes = randomBytes(rng, std::reduce(chunks.begin(), chunks.end()));
+        const QString path = fake.writeFile(QString::number(bytes.size()), bytes);
+        return Case{path, referenceCrc(bytes), chunks, nullptr};
+    };
+    const QString readOnly = fake.writeFile(QStringLiteral("read-only.bin"), "123456789");
+    ASSERT_TRUE(QFile::setPermissions(readOnly, QFile::ReadOwner));
+    const QString huge = fake.writeFile(QStringLiteral("huge.bin"));
+    ASSERT_TRUE(QFile(huge).resize(qint64(64) << 20)); // sparse: 64 MiB of zeros
+    std::vector<qsizetype> hugeChunks(2048, 32767);
+    hugeChunks.push_back(2048);
+    const QString locked = fake.writeFile(QStringLiteral("locked.bin"), "123456789");
+    ASSERT_TRUE(QFile::setPermissions(locked, {}));
+    const QString fifo = fake.root() + QStringLiteral("/pipe");
+    ASSERT_EQ(::mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
+    const QString missing = fake.root() + QStringLiteral("/no such.bin");
+    const Case cases[] = {randomFile({}),
+                          randomFile({1}),
+                          randomFile({32768}),
+                          randomFile({32767, 2}),
+                          randomFile({32767, 32768}),
+                          randomFile({32767, 32767, 2}),
+                          {readOnly, 0xCBF43926u, {9}, nullptr}, // the check value
+                          {huge, 0xB2EB30EDu, hugeChunks, nullptr},
+                          {missing, 0, {}, "Error: 53. File not found"},
+                          {QString(), 0, {}, "Error: 53. File not found"},
+                          {fake.makeFolder("dir"), 0, {}, "Error: 75. Path/File access error"},
+                          {fifo, 0, {}, "Error: 75. Path/File access error"},
+                          {locked, 0, {}, "Error: 70. Permission denied"}};
+    const NoPermissionOverride asAnyone;
+    ASSERT_TRUE(asAnyone.holds());
+    for (const auto& [path, value, chunks, error] : cases) {
+        SCOPED_TRACE(path.toStdString());
+        std::vector<float> expected(error ? 0 : 1, 0.0f);
         qsizetype done = 0;
-        for (const qsizetype chunk : c.chunks) {
-            done += chunk;
-            expected.push_back(static_cast<float>(double(done) / double(c.size)));
+        for (const qsizetype chunk : chunks)
+            expected.push_back(static_cast<float>(
+                double(done += chunk) / double(std::reduce(chunks.begin(), chunks.end()))));
+        for (int call = 0; call < 2; ++call) {
+            fake.dialogs.boxes.clear();
+            progress.clear();
+            crc.setInputFileName(path);
+            EXPECT_EQ(crc.GetCRCFromFile(), static_cast<qint32>(value));
+            EXPECT_EQ(progress, expected);
+            EXPECT_EQ(boxLines(fake.dialogs),
+                      error ? Lines{"GetCRCFromFile | " + std::string(error) + " | Ok | None"}
+                            : Lines{});
         }
-        EXPECT_EQ(m_progress, expected);
     }
-    EXPECT_EQ(crcOfFile({}), 0);
-    EXPECT_TRUE(m_fake.dialogs.boxes.empty());
+    EXPECT_FALSE(QFileInfo::exists(missing));
+
+    // A text is checksummed as its UTF-16LE code units.
+    const std::pair<QString, QByteArray> texts[] = {
+        {QString(), QByteArray()},
+        {QStringLiteral("A"), QByteArray("\x41\x00", 2)},
+        {QStringLiteral("abc"), QByteArray("a\0b\0c\0", 6)},
+        {QStringLiteral("\u00e9\u20ac"), QByteArray("\xe9\x00\xac\x20", 4)},
+    };
+    for (const auto& [text, bytes] : texts) {
+        SCOPED_TRACE(text.toStdString());
+        progress.clear();
+        EXPECT_EQ(crc.GetCRCFromString(text), static_cast<qint32>(referenceCrc(bytes)));
+        ASSERT_FALSE(progress.empty());
+        EXPECT_EQ(progress.back(), 1.0f);
+    }
 }
 
-// Every kernel, started at any alignment and fed in pieces, gives the bit-by-bit CRC.
+// Every kernel, started at any alignment, gives the bit-by-bit CRC; a running value carried
+// from one piece into the next is fed to them by the files above.
 TEST(Crc32Kernels, AgreeWithTheReferenceForEveryLengthAndAlignment) {
     std::mt19937 rng(7);
     const QByteArray data = randomBytes(rng, 4096 + 64);
@@ -106,72 +124,15 @@ TEST(Crc32Kernels, AgreeWithTheReferenceForEveryLengthAndAlignment) {
         kernels.push_back(crc32kernels::updateClmul);
     for (std::size_t length = 0; length <= 4096; length += (length < 300 ? 1 : 97)) {
         for (std::size_t offset : {0, 1, 3, 8, 15}) {
-            const quint32 expected = referenceCrc(QByteArrayView(data).sliced(
-                static_cast<qsizetype>(offset), static_cast<qsizetype>(length)));
+            const quint32 expected = referenceCrc(
+                data.sliced(static_cast<qsizetype>(offset), static_cast<qsizetype>(length)));
             for (auto kernel : kernels) {
                 SCOPED_TRACE(testing::Message() << "length " << length << " offset " << offset);
                 ASSERT_EQ(kernel(crc32kernels::kInitial, bytes + offset, length) ^ 0xFFFFFFFFu,
                           expected);
-                // Fed in two pieces, the running value carries across.
-                const std::size_t split = length / 3;
-                const std::uint32_t head = kernel(crc32kernels::kInitial, bytes + offset, split);
-                ASSERT_EQ(kernel(head, bytes + offset + split, length - split) ^ 0xFFFFFFFFu,
-                          expected);
             }
         }
     }
-}
-
-TEST_F(Crc32Test, StringsAreChecksummedAsUtf16LittleEndian) {
-    struct Case {
-        QString text;
-        QByteArray bytes;
-    };
-    const std::vector<Case> cases = {
-        {QString(), QByteArray()},
-        {QStringLiteral("A"), QByteArray("\x41\x00", 2)},
-        {QStringLiteral("abc"), QByteArray("a\0b\0c\0", 6)},
-        {QStringLiteral("\u00e9\u20ac"), QByteArray("\xe9\x00\xac\x20", 4)},
-    };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.text.toStdString());
-        m_progress.clear();
-        EXPECT_EQ(m_crc.GetCRCFromString(c.text), static_cast<qint32>(referenceCrc(c.bytes)));
-        ASSERT_FALSE(m_progress.empty());
-        EXPECT_EQ(m_progress.back(), 1.0f);
-    }
-}
-
-// What cannot be read gives 0 and one box naming the fault; a missing file is not created
-// and a FIFO must not hang the call.
-TEST_F(Crc32Test, FilesThatCannotBeReadGiveZeroAndOneBox) {
-    const QString missing = m_fake.root() + QStringLiteral("/no such.bin");
-    const QString fifo = m_fake.root() + QStringLiteral("/pipe");
-    ASSERT_EQ(::mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
-    const QString locked = m_fake.writeFile(QStringLiteral("locked.bin"), "123456789");
-    ASSERT_EQ(::chmod(QFile::encodeName(locked).constData(), 0444), 0);
-    m_crc.setInputFileName(locked); // read-only is readable
-    EXPECT_EQ(m_crc.GetCRCFromFile(), static_cast<qint32>(0xCBF43926u));
-    ASSERT_EQ(::chmod(QFile::encodeName(locked).constData(), 0), 0);
-    const NoPermissionOverride asAnyone;
-    ASSERT_TRUE(asAnyone.holds());
-
-    const std::pair<QString, const char*> cases[] = {
-        {missing, "Error: 53. File not found"},
-        {QString(), "Error: 53. File not found"},
-        {m_fake.makeFolder(QStringLiteral("folder")), "Error: 75. Path/File access error"},
-        {fifo, "Error: 75. Path/File access error"},
-        {locked, "Error: 70. Permission denied"},
-    };
-    for (const auto& [path, error] : cases) {
-        SCOPED_TRACE(path.toStdString());
-        m_fake.dialogs.boxes.clear();
-        m_crc.setInputFileName(path);
-        EXPECT_EQ(m_crc.GetCRCFromFile(), 0);
-        EXPECT_EQ(boxLines(m_fake.dialogs),
-                  Lines{"GetCRCFromFile | " + std::string(error) + " | Ok | None"});
-    }
-    EXPECT_FALSE(QFileInfo::exists(missing));
 }
 
 } // namespace

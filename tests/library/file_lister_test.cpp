@@ -1,78 +1,90 @@
 #include "support/FakePlatform.h"
+#include "support/Unreadable.h"
 
+#include "library/Ascii.h"
 #include "library/FileLister.h"
 
-#include <QDir>
 #include <QFile>
+#include <QFileInfo>
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <vector>
 
-TEST(FilePattern, WildcardListsIgnoreCase) {
-    const FilePattern bins(QStringLiteral("*.bin;*.A26"));
-    EXPECT_TRUE(bins.matches(u"Pitfall.BIN"));
-    EXPECT_TRUE(bins.matches(u"combat.a26"));
-    EXPECT_FALSE(bins.matches(u"readme.txt"));
-    EXPECT_FALSE(bins.matches(u"x.bin.bak"));
-    EXPECT_TRUE(FilePattern(QStringLiteral("*.*")).matches(u"NoExtension"));
-    EXPECT_TRUE(FilePattern(QStringLiteral("p?t*.bin")).matches(u"Pitfall.bin"));
-    EXPECT_FALSE(FilePattern(QStringLiteral("p?t*.bin")).matches(u"Pt.bin"));
-    EXPECT_TRUE(FilePattern(QStringLiteral(" *.bin ; ")).matches(u"a.bin"));
-    EXPECT_FALSE(FilePattern(QString()).matches(u"a.bin"));
-    EXPECT_TRUE(FilePattern(QStringLiteral("*ÄPFEL*")).matches(u"äpfel.bin"));
-}
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
-TEST(FileLister, ListsMatchingRegularVisibleFilesSortedWithoutCase) {
-    FakePlatform fake;
-    const QString folder = fake.makeFolder("roms");
-    for (const char* name : {"b.bin", "A.bin", "c.BIN", ".hidden.bin", "notes.txt", "a.bin"})
-        fake.writeFile(QStringLiteral("roms/") + name);
-
-    FileLister lister;
-    lister.setPattern("*.bin");
-    lister.setPath(folder);
-    EXPECT_EQ(lister.names().toStringList(), (QStringList{"A.bin", "a.bin", "b.bin", "c.BIN"}));
-    EXPECT_EQ(lister.ListCount(), 4);
-    EXPECT_EQ(lister.List(3), "c.BIN");
-    EXPECT_EQ(lister.List(4), QString());
-    EXPECT_EQ(lister.List(-1), QString());
-}
-
-// Folders are matched name by name through a quicker path for plain ASCII wildcards; it
-// must agree with the general match on every shape of wildcard.
-TEST(FilePattern, TheAsciiPathAgreesWithTheGeneralMatch) {
-    const char* patterns[] = {"*.bin", "*.bin;*.a26", "pitfall.bin", "*",     "*.*", "p?t*.bin",
-                              "*bin",  "bin",         "**.bin",      "*.b?n", "*.",  "*pit*"};
-    const char* names[] = {"pitfall.bin", "x.bin.bak", "bin",   ".bin", "a.bin",    "pitfall.bi",
-                           "combat.a26",  "pt.bin",    "noext", "a.",   "spit.txt", "b"};
-    for (const char* p : patterns) {
-        const FilePattern pattern{QString::fromLatin1(p)};
-        ASSERT_TRUE(pattern.asciiOnly()) << p;
-        for (const char* n : names)
-            EXPECT_EQ(pattern.matchesFoldedAscii(n), pattern.matches(QString::fromLatin1(n)))
-                << p << " against " << n;
+// Each name goes through the general match and, where pattern and name are plain ASCII,
+// through the quicker byte-wise one that folders are matched with.
+TEST(FilePattern, WildcardListsMatchWholeNamesWithoutCase) {
+    const struct {
+        const char* pattern;
+        std::vector<const char*> matching, others;
+    } cases[] = {
+        {"*.bin;*.A26", {"Pitfall.BIN", "combat.a26", ".bin"}, {"readme.txt", "x.bin.bak", "bin"}},
+        {" *.bin ; ", {"a.bin"}, {}},
+        {"", {}, {"a.bin"}},
+        {"**.bin", {"a.bin"}, {}},
+        {"*.*", {"NoExtension"}, {}},
+        {"*.", {"a."}, {"noext"}},
+        {"*", {"b"}, {}},
+        {"pitfall.bin", {"PITFALL.bin"}, {"pitfall.bi"}},
+        {"p?t*.bin", {"Pitfall.bin"}, {"Pt.bin"}},
+        {"*pit*", {"spit.txt"}, {}},
+        // A star in the name is no wildcard of its own: the pattern's star still spans it.
+        {"*.bin", {"*game.bin"}, {}},
+        {"*.b?n", {"*game.bin"}, {}},
+        {"*g*", {}, {"x*.bin"}},
+        // Letters beyond ASCII fold too, in the pattern and in the name.
+        {"*ÄPFEL*", {"äpfel.bin"}, {}},
+        {"*.bin", {"Émulé.BIN"}, {}},
+    };
+    for (const auto& c : cases) {
+        const FilePattern pattern{QString::fromUtf8(c.pattern)};
+        for (const bool matches : {true, false}) {
+            for (const char* n : matches ? c.matching : c.others) {
+                const QString name = QString::fromUtf8(n);
+                EXPECT_EQ(pattern.matches(name), matches) << c.pattern << " on " << n;
+                if (pattern.asciiOnly() && isAscii(name)) {
+                    EXPECT_EQ(pattern.matchesFoldedAscii(name.toLower().toStdString()), matches)
+                        << c.pattern << " on " << n << " (ASCII)";
+                }
+            }
+        }
     }
 }
 
-// A folder too large to match in one go is matched on another thread while it is read, in
-// batches that are merged afterwards: the order must be the one a plain sort gives.
-TEST(FileLister, ALargeFolderIsSortedAsOneList) {
+// A folder lists its regular, visible, matching files (links to them too), sorted without
+// regard to case, then by their bytes, as one list though a large one is matched in batches
+// on another thread; anything else in it, or a path that is no readable folder, lists nothing.
+TEST(FileLister, ListsReadableRegularFilesSortedAsOneList) {
     FakePlatform fake;
     const QString folder = fake.makeFolder("roms");
     QStringList expected;
     // Names that share their first twenty characters, differ only in case, or are not
     // ASCII, in an order the folder does not keep.
-    for (int i = 0; i < 9000; ++i) {
-        const int n = (i * 7919) % 9000;
+    for (int i = 0; i < 10000; ++i) {
+        const int n = (i * 7919) % 10000;
         const QString name = n % 3 == 0 ? QStringLiteral("Activision Collection - %1.bin").arg(n)
                              : n % 3 == 1
                                  ? QStringLiteral("activision collection - %1.BIN").arg(n - 1)
                                  : QStringLiteral("Émulé %1.bin").arg(n);
-        QFile(folder + u'/' + name).open(QIODevice::WriteOnly);
+        ASSERT_TRUE(QFile(folder + u'/' + name).open(QIODevice::WriteOnly));
         expected.push_back(name);
     }
-    fake.writeFile(QStringLiteral("roms/notes.txt"));
+    fake.writeFile("roms/notes.txt");
+    fake.writeFile("roms/.hidden.bin");
+    fake.makeFolder("roms/sub.bin");
+    ASSERT_EQ(::mkfifo(QFile::encodeName(folder + "/pipe.bin").constData(), 0600), 0);
+    QFile::link(folder + "/nowhere", folder + "/dangling.bin");
+    QFile::link(folder + "/loop.bin", folder + "/loop.bin");
+    QFile::link(folder + u'/' + expected[0], folder + "/link.bin");
+    // A name that is not UTF-8, as on a file copied from an old Latin-1 disk.
+    const QByteArray latin1 = QFile::encodeName(folder) + "/Pitfall\xe9.bin";
+    ASSERT_EQ(::close(::creat(latin1.constData(), 0600)), 0);
+    expected << "link.bin" << QFileInfo(QFile::decodeName(latin1)).fileName();
     const auto key = [](const QString& name) {
         return std::pair(name.toCaseFolded().toUtf8(), name.toUtf8());
     };
@@ -83,4 +95,19 @@ TEST(FileLister, ALargeFolderIsSortedAsOneList) {
     lister.setPattern("*.bin");
     lister.setPath(folder);
     EXPECT_EQ(lister.names().toStringList(), expected);
+    EXPECT_EQ(lister.List(-1), QString());
+    EXPECT_EQ(lister.List(lister.ListCount()), QString());
+    // Paths that are no readable folder, one of them a folder that cannot be read.
+    const QString locked = fake.makeFolder("locked");
+    fake.writeFile("locked/a.bin");
+    ASSERT_TRUE(QFile::setPermissions(locked, {}));
+    const NoPermissionOverride asAnyone;
+    ASSERT_TRUE(asAnyone.holds());
+    for (const QString& path : {fake.writeFile("file.bin"), fake.makeFolder("empty"), locked,
+                                fake.root() + "/gone", QString()}) {
+        lister.setPath(path);
+        EXPECT_EQ(lister.ListCount(), 0) << path.toStdString();
+    }
+    QFile::setPermissions(locked, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    ::unlink(latin1.constData()); // the temporary folder cannot remove it by its decoded name
 }

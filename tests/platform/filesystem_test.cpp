@@ -3,31 +3,32 @@
 #include "platform/Dialogs.h"
 #include "platform/FileSystem.h"
 
-#include <QDir>
-
 #include <gtest/gtest.h>
 
-TEST(FileExist, FindsFilesFoldersAndWildcards) {
+// FileExist finds files, folders and wildcard matches of the last element; GetShortPath gives
+// the absolute path of a file or folder that exists, and the empty text for anything else.
+TEST(FileSystem, FileExistAndGetShortPath) {
     FakePlatform fake;
-    const QString file = fake.writeFile("roms/Pitfall.bin", "x");
-    const QString folder = fake.makeFolder("roms");
-    EXPECT_TRUE(FileExist(file));
-    EXPECT_TRUE(FileExist(folder));
-    EXPECT_TRUE(FileExist(folder + "/*.bin"));
-    EXPECT_TRUE(FileExist(folder + "/Pit?all.*"));
-    EXPECT_FALSE(FileExist(folder + "/*.a26"));
-    EXPECT_FALSE(FileExist(folder + "/missing.bin"));
-    EXPECT_FALSE(FileExist(fake.root() + "/nowhere/*.bin"));
-    EXPECT_FALSE(FileExist(QString()));
-}
-
-TEST(GetShortPath, GivesTheAbsolutePathOfWhatExists) {
-    FakePlatform fake;
-    const QString file = fake.writeFile("my roms/Space Invaders.bin", "x");
-    EXPECT_EQ(GetShortPath(file), QDir::cleanPath(file));
-    EXPECT_EQ(GetShortPath(fake.root() + "/my roms/../my roms"), fake.root() + "/my roms");
-    EXPECT_EQ(GetShortPath(fake.root() + "/my roms/absent.bin"), QString());
-    EXPECT_EQ(GetShortPath(QString()), QString());
+    const QString folder = fake.makeFolder("my roms");
+    const QString file = fake.writeFile("my roms/Pitfall.bin", "x");
+    const struct {
+        QString path;
+        bool exists;
+        QString shortPath;
+    } cases[] = {
+        {file, true, file},
+        {folder + "/../my roms", true, folder},
+        {folder + "/*.bin", true, QString()},
+        {folder + "/Pit?all.*", true, QString()},
+        {folder + "/*.a26", false, QString()},
+        {folder + "/missing.bin", false, QString()},
+        {fake.root() + "/nowhere/*.bin", false, QString()},
+        {QString(), false, QString()},
+    };
+    for (const auto& c : cases) {
+        EXPECT_EQ(FileExist(c.path), c.exists) << c.path.toStdString();
+        EXPECT_EQ(GetShortPath(c.path), c.shortPath) << c.path.toStdString();
+    }
 }
 
 TEST(FileFilter, WindowsFiltersBecomeQtFilters) {
