@@ -39,7 +39,8 @@ public:
 
     // Lists each folder once and keeps the names the search matches, all of them for an
     // empty search. `progress` is called with done 0 once every folder is listed, then at
-    // least every thousandth of the names, and last with done equal to total.
+    // least every thousandth of the names while a search is matched (without one, each
+    // folder is taken whole at once), and last with done equal to total.
     RomRows refresh(const QStringList& folders, const QString& pattern, const QString& search,
                     const RefreshProgress& progress);
 

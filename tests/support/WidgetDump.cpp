@@ -1,6 +1,7 @@
 #include "support/WidgetDump.h"
 
 #include <QAbstractButton>
+#include <QAbstractItemView>
 #include <QAction>
 #include <QComboBox>
 #include <QDir>
@@ -14,7 +15,6 @@
 #include <QMenu>
 #include <QTabBar>
 #include <QTabWidget>
-#include <QTreeWidget>
 #include <QWidget>
 
 #include <gtest/gtest.h>
@@ -44,14 +44,17 @@ void dumpAction(const QAction& action, int depth, QStringList& lines) {
         line += QStringLiteral(" shortcut ") + action.shortcut().toString();
     if (action.isCheckable())
         line += action.isChecked() ? QStringLiteral(" checked") : QStringLiteral(" unchecked");
+    if (!action.icon().isNull())
+        line += QStringLiteral(" icon");
     if (!action.isEnabled())
         line += QStringLiteral(" disabled");
     if (!action.isVisible())
         line += QStringLiteral(" hidden");
     lines << line;
-    if (QMenu* menu = action.menu(); menu && menu->objectName() != action.objectName())
-        for (const QAction* child : menu->actions())
-            dumpAction(*child, depth + 1, lines);
+    // A menu's items follow the action that opens it.
+    if (const QMenu* menu = action.menu())
+        for (const QAction* item : menu->actions())
+            dumpAction(*item, depth + 1, lines);
 }
 
 QString describe(const QWidget& w) {
@@ -85,10 +88,14 @@ QString describe(const QWidget& w) {
         line += QStringLiteral(" tabs [%1] current %2")
                     .arg(captions.join(QStringLiteral(" | ")))
                     .arg(tabs->currentIndex());
-    } else if (const auto* tree = qobject_cast<const QTreeWidget*>(&w)) {
+    } else if (const auto* view = qobject_cast<const QAbstractItemView*>(&w);
+               view && view->model()) {
+        // Column headers with their tool tips.
+        const QAbstractItemModel& model = *view->model();
         QStringList headers;
-        for (int i = 0; i < tree->columnCount(); ++i)
-            headers << tree->headerItem()->text(i) + u'/' + tree->headerItem()->toolTip(i);
+        for (int i = 0; i < model.columnCount(); ++i)
+            headers << model.headerData(i, Qt::Horizontal).toString() + u'/' +
+                           model.headerData(i, Qt::Horizontal, Qt::ToolTipRole).toString();
         line += QStringLiteral(" columns [%1]").arg(headers.join(QStringLiteral(" | ")));
     }
     if (!w.toolTip().isEmpty())
@@ -101,28 +108,29 @@ QString describe(const QWidget& w) {
 }
 
 void dumpWidget(const QWidget& w, int depth, QStringList& lines) {
+    if (const auto* menu = qobject_cast<const QMenu*>(&w)) {
+        // A menu placed in a menu bar or another menu is dumped with the action that opens
+        // it; a pop-up menu on its own. Unnamed ones are Qt's (a menu bar's overflow).
+        if (menu->objectName().isEmpty() || !menu->menuAction()->associatedObjects().isEmpty())
+            return;
+        lines << QString(depth * 2, u' ') + QStringLiteral("QMenu ") + menu->objectName() + u' ' +
+                     quoted(menu->title());
+        for (const QAction* action : menu->actions())
+            dumpAction(*action, depth + 1, lines);
+        return;
+    }
+    // A tab bar's own scroll buttons depend on the style, not on the window.
+    if (qobject_cast<const QTabBar*>(&w))
+        return;
     const bool bNamed = !w.objectName().isEmpty() && !w.objectName().startsWith(u"qt_");
     if (bNamed)
         lines << QString(depth * 2, u' ') + describe(w);
     const int inner = bNamed ? depth + 1 : depth;
-    // A tab bar's own scroll buttons depend on the style, not on the window.
-    if (qobject_cast<const QTabBar*>(&w))
-        return;
     for (const QAction* action : w.actions())
-        if (!qobject_cast<const QMenu*>(&w) || action->menu() == nullptr)
-            dumpAction(*action, inner, lines);
-    for (const QObject* child : w.children()) {
-        if (const auto* widget = qobject_cast<const QWidget*>(child)) {
-            if (const auto* menu = qobject_cast<const QMenu*>(widget)) {
-                lines << QString(inner * 2, u' ') + QStringLiteral("QMenu ") + menu->objectName() +
-                             u' ' + quoted(menu->title());
-                for (const QAction* action : menu->actions())
-                    dumpAction(*action, inner + 1, lines);
-                continue;
-            }
+        dumpAction(*action, inner, lines);
+    for (const QObject* child : w.children())
+        if (const auto* widget = qobject_cast<const QWidget*>(child))
             dumpWidget(*widget, inner, lines);
-        }
-    }
 }
 
 QString goldenPath(const QString& name) {
