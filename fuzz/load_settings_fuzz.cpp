@@ -1,9 +1,10 @@
 // An option set loaded into the settings window: any bytes as a .lum file, through
-// frmSettings::LoadSettings into the live controls. One window serves every input; before
+// frmSettings::LoadSettings into the window's options and controls. One window serves every input; before
 // each one it is put back into its start state, so a finding replays from its file alone.
 #include "FuzzSupport.h"
 
-#include "emulator/ConfigRecord.h"
+#include "emulator/OptionFile.h"
+#include "emulator/Switches.h"
 #include "platform/Dialogs.h"
 #include "platform/Downloader.h"
 #include "platform/Platform.h"
@@ -106,19 +107,19 @@ struct Harness {
 
 Harness* harness = nullptr;
 
-ConfigLimits limitsOf(const frmSettings& w) {
-    return {w.comboVideoMode->count(),
-            std::min(w.comboLeftController->count(), w.comboRightController->count()),
-            w.comboGT->count()};
+QString preview(const frmSettings& w) {
+    return w.findChild<QLabel*>(QStringLiteral("lblDOSOutput"))->text();
 }
 
 void checkWindow(frmSettings& w) {
-    for (const QComboBox* list :
-         {w.comboVideoMode, w.comboLeftController, w.comboRightController, w.comboGT})
+    for (const char* name :
+         {"comboVideoMode", "comboLeftController", "comboRightController", "comboGT"}) {
+        const auto* list = w.findChild<QComboBox*>(QLatin1String(name));
         FUZZ_CHECK(list->currentIndex() >= -1 && list->currentIndex() < list->count());
+    }
     // The sliders are not checked against their scales: like the user's own bars, they
-    // take any whole value. The preview was rebuilt from the controls as they now are.
-    FUZZ_CHECK(w.lblDOSOutput->text() == w.LaunchSwitches().mid(1));
+    // take any whole value. The preview shows the options as they now are.
+    FUZZ_CHECK(preview(w) == launchSwitches(w.options()).mid(1));
 }
 
 bool writeFile(const QString& path, const QByteArray& bytes) {
@@ -161,20 +162,20 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     FUZZ_CHECK(writeFile(h.input, bytes));
 
     FUZZ_CHECK(w.LoadSettings(h.startState));
-    const QString startPreview = w.lblDOSOutput->text();
+    const QString startPreview = preview(w);
 
-    // True exactly when the record decodes as acceptable; a failure says so once.
-    const bool ok = decodeConfig(bytes, limitsOf(w)).ok();
+    // True exactly when the set decodes whole; a failure says so once.
+    const bool ok = decodeOptions(bytes, w.options()).ok();
     const int boxesBefore = h.dialogs.boxes;
     const bool loaded = w.LoadSettings(h.input);
     FUZZ_CHECK(loaded == ok);
     FUZZ_CHECK(h.dialogs.boxes - boxesBefore == (ok ? 0 : 1));
     checkWindow(w);
-    const QString preview = w.lblDOSOutput->text();
+    const QString shown = preview(w);
 
     // The same bytes again change nothing more.
     FUZZ_CHECK(w.LoadSettings(h.input) == loaded);
-    FUZZ_CHECK(w.lblDOSOutput->text() == preview);
+    FUZZ_CHECK(preview(w) == shown);
     checkWindow(w);
 
     // A set that loaded saves to one that loads to the same preview.
@@ -182,9 +183,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         h.dialogs.savePath = h.dir.filePath(QStringLiteral("saved.lum"));
         w.cmdSaveDat_Click();
         FUZZ_CHECK(w.LoadSettings(h.startState));
-        FUZZ_CHECK(w.lblDOSOutput->text() == startPreview);
+        FUZZ_CHECK(preview(w) == startPreview);
         FUZZ_CHECK(w.LoadSettings(h.dialogs.savePath));
-        FUZZ_CHECK(w.lblDOSOutput->text() == preview);
+        FUZZ_CHECK(preview(w) == shown);
     }
     return 0;
 }
