@@ -2,22 +2,16 @@
 
 #include <cmath>
 
-std::optional<PictureFit> FitPictureToBox(QSizeF picture, float height, float width,
-                                          bool subtractFrame, float top, float left) {
+std::optional<PictureFit> FitPictureToBox(QSizeF picture, float height, float width) {
     const float pictureHeight = static_cast<float>(picture.height());
     const float pictureWidth = static_cast<float>(picture.width());
     if (!(pictureHeight > 0) || !(pictureWidth > 0) || !std::isfinite(pictureHeight) ||
         !std::isfinite(pictureWidth))
         return std::nullopt;
 
-    float h = height;
-    float w = width;
-    if (subtractFrame) {
-        h -= kPreviewFrameHeight;
-        w -= kPreviewFrameWidth;
-    }
-    PictureFit fit{top, left, 0, 0};
-    // A window smaller than its frame leaves no room to show anything.
+    const float h = height;
+    const float w = width;
+    PictureFit fit;
     if (!(h > 0) || !(w > 0))
         return fit;
 
@@ -26,11 +20,11 @@ std::optional<PictureFit> FitPictureToBox(QSizeF picture, float height, float wi
     if (rp <= rb) {
         fit.width = w;
         fit.height = fit.width * rp;
-        fit.top = top + h / 2 - fit.height / 2;
+        fit.top = h / 2 - fit.height / 2;
     } else {
         fit.height = h;
         fit.width = fit.height / rp;
-        fit.left = left + w / 2 - fit.width / 2;
+        fit.left = w / 2 - fit.width / 2;
     }
     return fit;
 }

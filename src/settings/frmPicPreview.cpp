@@ -70,17 +70,6 @@ bool frmPicPreview::showPicture(const QString& path, const QString& caption) {
     return true;
 }
 
-void frmPicPreview::setPicturePath(const QString& path) {
-    const QPixmap picture = loadPicture(path);
-    if (picture.isNull()) {
-        // The path is taken; the picture shown before stays.
-        Label1->setText(path);
-        refit();
-        return;
-    }
-    takePicture(path, picture);
-}
-
 QString frmPicPreview::picturePath() const {
     return Label1->text();
 }
@@ -103,9 +92,8 @@ void frmPicPreview::refit() {
         return;
     // Qt knows the window's inner size exactly, so there is no frame to estimate and take
     // off; the box is the client area in pixels.
-    const std::optional<PictureFit> fit =
-        FitPictureToBox(picture.deviceIndependentSize(), static_cast<float>(height()),
-                        static_cast<float>(width()), false);
+    const std::optional<PictureFit> fit = FitPictureToBox(
+        picture.deviceIndependentSize(), static_cast<float>(height()), static_cast<float>(width()));
     if (!fit)
         return;
     PPImg->setGeometry(

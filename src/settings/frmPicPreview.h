@@ -21,9 +21,7 @@ public:
     // then.
     bool showPicture(const QString& path, const QString& caption);
 
-    // Label1's caption: the path of the picture to show. Every change re-fits the
-    // picture; a file that cannot be loaded keeps the picture shown before.
-    void setPicturePath(const QString& path);
+    // The path of the picture shown (Label1's caption).
     QString picturePath() const;
 
     // Places the image control for the window's current size, unless minimized.

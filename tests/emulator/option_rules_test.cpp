@@ -92,58 +92,37 @@ TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
                                 3,  "Zero Value",   "Number Cannot Be Zero"};
     const LaunchGuard rateZero{"", "Video",      "txtFPScustom",
                                3,  "Zero Value", "Number Cannot Be Zero"};
+    using O = EmulatorOptions;
     const struct {
-        const char* what;
-        void (*edit)(EmulatorOptions&);
+        void (*edit)(O&);
         std::vector<LaunchGuard> guards;
     } cases[] = {
-        {"start", [](EmulatorOptions&) {}, {}},
-        {"every device switched off",
-         [](EmulatorOptions& o) {
-             o.inactiveKeyboard = o.inactiveMouse = Check::On;
-             o.inactiveJoystick = o.inactiveStelladaptor = Check::On;
+        {[](O&) {}, {}},
+        {[](O& o) {
+             o.inactiveKeyboard = o.inactiveMouse = o.inactiveJoystick = o.inactiveStelladaptor =
+                 Check::On;
          },
          {noControllers}},
-        {"no controller on either port",
-         [](EmulatorOptions& o) { o.leftController = o.rightController = 12; },
-         {noControllers}},
-        {"grayed boxes leave a device in play",
-         [](EmulatorOptions& o) {
-             o.inactiveKeyboard = o.inactiveMouse = Check::On;
+        {[](O& o) { o.leftController = o.rightController = 12; }, {noControllers}},
+        // Grayed boxes leave a device in play, and a grayed lower sensitivity is off.
+        {[](O& o) {
+             o.inactiveKeyboard = o.inactiveMouse = Check::On,
              o.inactiveJoystick = o.inactiveStelladaptor = Check::Grayed;
          },
          {}},
-        {"lower sensitivity of zero",
-         [](EmulatorOptions& o) {
-             o.lowerSensitivity = Check::On;
-             o.lowerSensitivityBy = "0";
-         },
-         {lowerZero}},
-        {"grayed lower sensitivity",
-         [](EmulatorOptions& o) {
-             o.lowerSensitivity = Check::Grayed;
-             o.lowerSensitivityBy = "0";
-         },
-         {}},
-        {"empty custom rate",
-         [](EmulatorOptions& o) { o.frameRate = FrameRate::Custom; },
-         {rateZero}},
-        {"all at once, in the order they are met",
-         [](EmulatorOptions& o) {
-             o.leftController = o.rightController = 12;
-             o.lowerSensitivity = Check::On;
-             o.lowerSensitivityBy = "";
-             o.frameRate = FrameRate::Custom;
-             o.customFrameRate = "abc";
+        {[](O& o) { o.lowerSensitivity = Check::On, o.lowerSensitivityBy = "0"; }, {lowerZero}},
+        {[](O& o) { o.lowerSensitivity = Check::Grayed, o.lowerSensitivityBy = "0"; }, {}},
+        {[](O& o) { o.frameRate = FrameRate::Custom; }, {rateZero}},
+        // All at once, in the order a launch meets them.
+        {[](O& o) {
+             o.leftController = o.rightController = 12, o.lowerSensitivity = Check::On,
+             o.lowerSensitivityBy = "", o.frameRate = FrameRate::Custom, o.customFrameRate = "abc";
          },
          {noControllers, lowerZero, rateZero}},
     };
-    for (const auto& c : cases) {
+    for (std::size_t n = 0; n < std::size(cases); ++n) {
         EmulatorOptions o;
-        c.edit(o);
-        const std::vector<LaunchGuard> guards = launchGuards(o);
-        ASSERT_EQ(guards.size(), c.guards.size()) << c.what;
-        for (std::size_t i = 0; i < guards.size(); ++i)
-            EXPECT_TRUE(guards[i] == c.guards[i]) << c.what << ' ' << i;
+        cases[n].edit(o);
+        EXPECT_TRUE(launchGuards(o) == cases[n].guards) << "case " << n;
     }
 }

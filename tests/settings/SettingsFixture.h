@@ -3,6 +3,7 @@
 #include "support/Boxes.h"
 #include "support/FakePlatform.h"
 #include "support/WidgetDump.h"
+#include "support/Widgets.h"
 
 #include "settings/frmSettings.h"
 

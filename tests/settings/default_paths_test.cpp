@@ -2,15 +2,7 @@
 
 #include "settings/DefaultPaths.h"
 
-#include <QAction>
 #include <QDir>
-#include <QLineEdit>
-#include <QMenu>
-#include <QPushButton>
-#include <QTabBar>
-#include <QTabWidget>
-#include <QTest>
-#include <QTreeWidget>
 
 namespace {
 

@@ -1,26 +1,13 @@
 #include "SettingsFixture.h"
 
+#include "support/SampleOptions.h"
+
 #include "emulator/Switches.h"
 #include "settings/SliderRules.h"
 #include "ui/cTextBoxXP.h"
 #include "ui/vbalProgressBar.h"
 
-#include <QAbstractButton>
-#include <QAction>
-#include <QApplication>
-#include <QCheckBox>
-#include <QComboBox>
-#include <QFocusEvent>
-#include <QGroupBox>
-#include <QLabel>
-#include <QLineEdit>
 #include <QLocale>
-#include <QMenu>
-#include <QMouseEvent>
-#include <QPushButton>
-#include <QRadioButton>
-#include <QSignalSpy>
-#include <QTest>
 
 #include <climits>
 
@@ -133,33 +120,9 @@ TEST_F(OptionControls, EachControlSpeaksThroughItsSwitch) {
 // Options shown in one window and copied control by control into another, as a user
 // would set them, give the same options: every control shows its own option.
 TEST_F(OptionControls, WhatTheControlsShowTheyGiveBack) {
-    EmulatorOptions o;
-    o.videoMode = 4;
-    o.videoStart = VideoStart::Window;
-    o.dsp = DspLevel::Low;
-    o.player1Hard = o.inactiveMouse = o.showScanline = Check::Grayed;
-    o.blackAndWhite = o.inactiveJoystick = o.swapPorts = o.quiet = o.lowerSensitivity = Check::On;
-    o.palColorLoss = o.syncWithSound = o.scanLineLimit = o.codeTrace = Check::On;
-    o.noFastCopy = o.startLineEnabled = Check::On;
-    o.mouseCapture = Check::Off;
-    o.screenCapture = CaptureFormat::Bmp;
-    o.leftController = 5;
-    o.rightController = 3;
-    o.paddleSensitivity = 11;
-    o.lightGunCycles = "3";
-    o.lightGunScanlines = "7";
-    o.soundQueue = 5000;
-    o.lowerSensitivityBy = "4";
-    o.mousePaddle1 = Paddle::P2;
-    o.mousePaddle2 = Paddle::P0;
-    o.frameRate = FrameRate::Custom;
-    o.customFrameRate = "59";
-    o.narrow = NarrowMode::Mode1;
-    o.palette = Palette::Ntsc;
-    o.phosphor = 40;
-    o.scanLines = "250";
-    o.gameType = 9;
-    o.startLine = "30";
+    EmulatorOptions o = sampleOptions();
+    o.lightGun = Check::Off; // retired: no control shows them
+    o.keyboardPaddle = Paddle::None;
     w->setOptions(o);
     EXPECT_EQ(w->options(), o);
     EXPECT_EQ(bar("BarColorSoundQueue"), "4900..5100 at 5000 '5,000'");

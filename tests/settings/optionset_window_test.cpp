@@ -5,10 +5,7 @@
 
 #include "emulator/OptionFile.h"
 
-#include <QComboBox>
 #include <QFile>
-#include <QLabel>
-#include <QRadioButton>
 #include <QtEndian>
 
 namespace {

@@ -4,14 +4,6 @@
 #include "ui/PictureBox.h"
 #include "ui/Twips.h"
 
-#include <QCheckBox>
-#include <QComboBox>
-#include <QLineEdit>
-#include <QRadioButton>
-#include <QTabBar>
-#include <QTabWidget>
-#include <QTest>
-
 namespace {
 
 using SettingsWindow = SettingsFixture;
