@@ -29,50 +29,65 @@ struct EmulatorOptions {
     // The options as the settings window starts.
     EmulatorOptions();
 
+    // Settings page: how the game starts.
     int videoMode{};               // comboVideoMode, an entry of kVideoModeEntries (-1 none)
     VideoStart videoStart{};       // optVMDefault, optVMFull, optVMWindow
-    DspLevel dsp{};                // optDSPDefault, optDSPLow, optDSPHigh
-    Check player0Hard{};           // chkP0Hard
-    Check player1Hard{};           // chkP1Hard
-    Check blackAndWhite{};         // chkBW
     CaptureFormat screenCapture{}; // optSCPCX, optSCBMP
-    int leftController{};          // comboLeftController, an entry of kControllerEntries
-    int rightController{};         // comboRightController
-    Check inactiveKeyboard{};      // chkIPCKeyboard
-    Check inactiveMouse{};         // chkIPCMouse
-    Check inactiveJoystick{};      // chkIPCJoystick
-    Check inactiveStelladaptor{};  // chkIPCStella
-    int paddleSensitivity{};       // BarColorPaddle
-    Check lightGun{};              // chkLightGun: retired, kept in option sets only
-    QString lightGunCycles;        // txtLightGunCycles
-    QString lightGunScanlines;     // txtLightGunScan
-    Check swapPorts{};             // chkSwapControl
-    Check quiet{};                 // chkQuiet
-    int soundQueue{};              // BarColorSoundQueue
-    Check lowerSensitivity{};      // chkLowerSens
-    QString lowerSensitivityBy;    // txtLowerSens, in scanlines
-    Paddle keyboardPaddle{};       // optPaddleKey: retired, kept in option sets only
-    Paddle mousePaddle1{};         // optPaddleM1_0 .. optPaddleM1_3, optPaddleM1None
-    Paddle mousePaddle2{};         // optPaddleM2_0 .. optPaddleM2_3, optPaddleM2None
-    Check palColorLoss{};          // chkPALColorLoss
-    Check interlaced{};            // chkInterlaced
-    Check syncWithSound{};         // chkSyncWSound
-    FrameRate frameRate{};         // optFPSDefault, optFPSmonitor, optFPScustom
-    QString customFrameRate;       // txtFPScustom
-    NarrowMode narrow{};           // optNarrowNot, optNarrow1, optNarrow2
-    Palette palette{};             // optCPDefault, optCPNTSC, optCPPAL, optCPSECAM
-    int phosphor{};                // BarColorPhos
-    Check scanLineLimit{};         // chkScanLines
-    QString scanLines;             // txtScanLines
-    Check mouseCapture{};          // chkMouseCapture
-    Check showScanline{};          // chkShowScanline
-    Check codeTrace{};             // chkCodeTrace
-    Check printChecksum{};         // chkPrintChecksum
-    Check noFastCopy{};            // chkFastCopy
-    Check allow4Directions{};      // chkAllow4
-    int gameType{};                // comboGT, an entry of kGameTypeEntries
-    Check startLineEnabled{};      // chkLineScan
-    QString startLine;             // txtLineScan
+    DspLevel dsp{};                // optDSPDefault, optDSPLow, optDSPHigh
+    // Settings page: "Start game with...".
+    Check player0Hard{};   // chkP0Hard
+    Check player1Hard{};   // chkP1Hard
+    Check blackAndWhite{}; // chkBW
+
+    // Controls page: the ports and the PC devices that drive them.
+    int leftController{};    // comboLeftController, an entry of kControllerEntries
+    int rightController{};   // comboRightController
+    Check swapPorts{};       // chkSwapControl
+    int paddleSensitivity{}; // BarColorPaddle
+    // Controls page: "Inactivate PC-controller".
+    Check inactiveKeyboard{};     // chkIPCKeyboard
+    Check inactiveMouse{};        // chkIPCMouse
+    Check inactiveJoystick{};     // chkIPCJoystick
+    Check inactiveStelladaptor{}; // chkIPCStella
+    // Controls page: the light gun's adjustments, and its retired box.
+    QString lightGunCycles;    // txtLightGunCycles
+    QString lightGunScanlines; // txtLightGunScan
+    Check lightGun{};          // chkLightGun: kept in option sets only, never shown
+
+    // Paddles / Audio page.
+    Check lowerSensitivity{};   // chkLowerSens
+    QString lowerSensitivityBy; // txtLowerSens, in scanlines
+    Check quiet{};              // chkQuiet
+    int soundQueue{};           // BarColorSoundQueue
+    // Paddles / Audio page: the mice's paddles, and the keyboard's, which is retired.
+    Paddle mousePaddle1{};   // optPaddleM1_0 .. optPaddleM1_3, optPaddleM1None
+    Paddle mousePaddle2{};   // optPaddleM2_0 .. optPaddleM2_3, optPaddleM2None
+    Paddle keyboardPaddle{}; // optPaddleKey: kept in option sets only, never shown
+
+    // Video page.
+    Check scanLineLimit{};   // chkScanLines
+    QString scanLines;       // txtScanLines
+    FrameRate frameRate{};   // optFPSDefault, optFPSmonitor, optFPScustom
+    QString customFrameRate; // txtFPScustom
+    // Video page: the picture.
+    NarrowMode narrow{};   // optNarrowNot, optNarrow1, optNarrow2
+    Palette palette{};     // optCPDefault, optCPNTSC, optCPPAL, optCPSECAM
+    int phosphor{};        // BarColorPhos
+    Check palColorLoss{};  // chkPALColorLoss
+    Check interlaced{};    // chkInterlaced
+    Check syncWithSound{}; // chkSyncWSound
+
+    // Debugging page.
+    Check startLineEnabled{}; // chkLineScan
+    QString startLine;        // txtLineScan
+    int gameType{};           // comboGT, an entry of kGameTypeEntries
+    Check mouseCapture{};     // chkMouseCapture
+    // Debugging page: what z26 shows and writes.
+    Check showScanline{};     // chkShowScanline
+    Check codeTrace{};        // chkCodeTrace
+    Check printChecksum{};    // chkPrintChecksum
+    Check noFastCopy{};       // chkFastCopy
+    Check allow4Directions{}; // chkAllow4
 
     bool operator==(const EmulatorOptions&) const = default;
 };

@@ -3,15 +3,9 @@
 #include "emulator/LeadingNumber.h"
 #include "emulator/OptionRules.h"
 
-#include <iterator>
-
 namespace switches {
 
 namespace {
-
-QString flag(Check check, const char* switchText) {
-    return isOn(check) ? QLatin1String(switchText) : QString();
-}
 
 QString controller(int index, const char* mark) {
     const Controller* entry = controllerAt(index);
@@ -20,17 +14,15 @@ QString controller(int index, const char* mark) {
     return QLatin1String(" -") + QLatin1String(mark) + QLatin1String(entry->code);
 }
 
-// One switch of a group of option buttons, by the button selected ("" for none).
-template <class E, std::size_t N>
-QString choice(E selected, const std::array<const char*, N>& texts) {
-    return QLatin1String(texts[static_cast<std::size_t>(selected)]);
-}
-
 int paddleDigit(::Paddle paddle) {
     return paddle == ::Paddle::None ? -1 : static_cast<int>(paddle);
 }
 
 } // namespace
+
+QString FieldSwitch::operator()(const EmulatorOptions& o) const {
+    return isOn(o.*box) ? QLatin1String(text) + normalisedNumberText(o.*field) : QString();
+}
 
 QString LeftController(const EmulatorOptions& o) {
     return controller(o.leftController, ")");
@@ -38,56 +30,6 @@ QString LeftController(const EmulatorOptions& o) {
 
 QString RightController(const EmulatorOptions& o) {
     return controller(o.rightController, "(");
-}
-
-QString Interlaced(const EmulatorOptions& o) {
-    return flag(o.interlaced, " -!");
-}
-
-QString P0Hard(const EmulatorOptions& o) {
-    return flag(o.player0Hard, " -0");
-}
-
-QString P1Hard(const EmulatorOptions& o) {
-    return flag(o.player1Hard, " -1");
-}
-
-QString All4(const EmulatorOptions& o) {
-    return flag(o.allow4Directions, " -4");
-}
-
-QString StartBW(const EmulatorOptions& o) {
-    return flag(o.blackAndWhite, " -b");
-}
-
-QString ScreenCapture(const EmulatorOptions& o) {
-    return choice(o.screenCapture, std::array{"", " -B"});
-}
-
-QString ColorPalette(const EmulatorOptions& o) {
-    return choice(o.palette, std::array{"", " -c0", " -c1", " -c2"});
-}
-
-QString DSP(const EmulatorOptions& o) {
-    return choice(o.dsp, std::array{"", " -d1", " -d2"});
-}
-
-QString Narrow(const EmulatorOptions& o) {
-    return choice(o.narrow, std::array{"", " -e1", " -e2"});
-}
-
-QString Phos(const EmulatorOptions& o) {
-    return o.phosphor == kPhosphorDefault ? QString()
-                                          : QStringLiteral(" -f") + QString::number(o.phosphor);
-}
-
-QString GameType(const EmulatorOptions& o) {
-    return o.gameType == 0 ? QString() : QStringLiteral(" -g") + QString::number(o.gameType);
-}
-
-QString ScanLines(const EmulatorOptions& o) {
-    return isOn(o.scanLineLimit) ? QStringLiteral(" -h") + normalisedNumberText(o.scanLines)
-                                 : QString();
 }
 
 QString IPC(const EmulatorOptions& o) {
@@ -140,24 +82,6 @@ QString LightGun(const EmulatorOptions& o) {
            normalisedNumberText(o.lightGunScanlines);
 }
 
-QString ShowScanline(const EmulatorOptions& o) {
-    return flag(o.showScanline, " -n");
-}
-
-QString PALColorLoss(const EmulatorOptions& o) {
-    return flag(o.palColorLoss, " -o");
-}
-
-QString Quiet(const EmulatorOptions& o) {
-    return flag(o.quiet, " -q");
-}
-
-QString SoundQueue(const EmulatorOptions& o) {
-    return o.soundQueue == kSoundQueueDefault
-               ? QString()
-               : QStringLiteral(" -s") + QString::number(o.soundQueue);
-}
-
 QString FPS(const EmulatorOptions& o) {
     switch (o.frameRate) {
     case FrameRate::Monitor:
@@ -169,15 +93,6 @@ QString FPS(const EmulatorOptions& o) {
         break;
     }
     return QString();
-}
-
-QString LineScan(const EmulatorOptions& o) {
-    return isOn(o.startLineEnabled) ? QStringLiteral(" -u") + normalisedNumberText(o.startLine)
-                                    : QString();
-}
-
-QString CodeTrace(const EmulatorOptions& o) {
-    return flag(o.codeTrace, " -t");
 }
 
 QString VideoMode(const EmulatorOptions& o) {
@@ -195,18 +110,6 @@ QString VideoMode(const EmulatorOptions& o) {
 
 QString SwapControl(const EmulatorOptions& o) {
     return o.swapPorts == Check::On ? QStringLiteral(" -w") : QString();
-}
-
-QString PrintChecksum(const EmulatorOptions& o) {
-    return flag(o.printChecksum, " -x");
-}
-
-QString FastCopy(const EmulatorOptions& o) {
-    return flag(o.noFastCopy, " -z");
-}
-
-QString SyncWSound(const EmulatorOptions& o) {
-    return flag(o.syncWithSound, " -R");
 }
 
 QString withoutLeadingBlank(const QString& switchText) {
@@ -231,47 +134,15 @@ QStringList emulatorArguments(const QString& romPath, const QString& switchText)
 
 } // namespace switches
 
-QString launchSwitches(const EmulatorOptions& options) {
+QString launchSwitches(const EmulatorOptions& o) {
     // The emulator reads its switches in any order; this one is what users have always
     // seen, so the preview and saved habits stay familiar.
     namespace s = switches;
-    static constexpr QString (*kOrder[])(const EmulatorOptions&) = {
-        s::LeftController,
-        s::RightController,
-        s::Interlaced,
-        s::P0Hard,
-        s::P1Hard,
-        s::All4,
-        s::StartBW,
-        s::ScreenCapture,
-        s::ColorPalette,
-        s::DSP,
-        s::Narrow,
-        s::Phos,
-        s::GameType,
-        s::ScanLines,
-        s::IPC,
-        s::PaddleSens,
-        s::LowerSens,
-        s::Paddle,
-        s::MouseCapture,
-        s::LightGun,
-        s::ShowScanline,
-        s::PALColorLoss,
-        s::Quiet,
-        s::SoundQueue,
-        s::FPS,
-        s::LineScan,
-        s::CodeTrace,
-        s::VideoMode,
-        s::SwapControl,
-        s::PrintChecksum,
-        s::FastCopy,
-        s::SyncWSound,
-    };
-    static_assert(std::size(kOrder) == 32);
-    QString text;
-    for (const auto builder : kOrder)
-        text += builder(options);
-    return text;
+    return s::LeftController(o) + s::RightController(o) + s::Interlaced(o) + s::P0Hard(o) +
+           s::P1Hard(o) + s::All4(o) + s::StartBW(o) + s::ScreenCapture(o) + s::ColorPalette(o) +
+           s::DSP(o) + s::Narrow(o) + s::Phos(o) + s::GameType(o) + s::ScanLines(o) + s::IPC(o) +
+           s::PaddleSens(o) + s::LowerSens(o) + s::Paddle(o) + s::MouseCapture(o) + s::LightGun(o) +
+           s::ShowScanline(o) + s::PALColorLoss(o) + s::Quiet(o) + s::SoundQueue(o) + s::FPS(o) +
+           s::LineScan(o) + s::CodeTrace(o) + s::VideoMode(o) + s::SwapControl(o) +
+           s::PrintChecksum(o) + s::FastCopy(o) + s::SyncWSound(o);
 }

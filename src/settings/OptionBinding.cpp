@@ -10,20 +10,16 @@
 #include <QRadioButton>
 #include <QSignalBlocker>
 
+#include <algorithm>
+
 namespace {
 
 using K = OptionKind;
 
+// Qt's states in its own order: unchecked, partially checked (grayed), checked.
 Check checkOf(Qt::CheckState state) {
-    switch (state) {
-    case Qt::Checked:
-        return Check::On;
-    case Qt::PartiallyChecked:
-        return Check::Grayed;
-    case Qt::Unchecked:
-        break;
-    }
-    return Check::Off;
+    constexpr Check kChecks[] = {Check::Off, Check::Grayed, Check::On};
+    return kChecks[std::clamp(static_cast<int>(state), 0, 2)];
 }
 
 QString sliderText(const OptionRow& row, int value) {

@@ -76,18 +76,19 @@ void frmSettings::connectOptionControls() {
     connect(m_ui->binding.get(), &OptionBinding::edited, this, &frmSettings::optionEdited);
 
     // A box or button that switches a number field on also takes the user there.
-    const std::pair<QAbstractButton*, QLineEdit*> fieldSwitches[] = {
-        {m_ui->chkLineScan, m_ui->txtLineScan},
-        {m_ui->chkScanLines, m_ui->txtScanLines},
-        {m_ui->chkLowerSens, m_ui->txtLowerSens},
-        {m_ui->optFPScustom, m_ui->txtFPScustom},
-        {m_ui->optFPSmonitor, m_ui->txtFPScustom}};
-    for (const auto& [control, field] : fieldSwitches)
-        connect(control, &QAbstractButton::clicked, field, [field = field] {
-            if (field->isEnabled())
-                field->setFocus();
-        });
-    for (QLineEdit* field : {m_ui->txtFPScustom, m_ui->txtLightGunCycles, m_ui->txtLightGunScan,
+    const std::pair<const char*, QLineEdit*> fieldSwitches[] = {
+        {"chkLineScan", m_ui->txtLineScan},
+        {"chkScanLines", m_ui->txtScanLines},
+        {"chkLowerSens", m_ui->txtLowerSens},
+        {"optFPScustom", m_ui->txtFPScustom},
+        {"optFPSmonitor", m_ui->txtFPScustom}};
+    for (const auto& [name, field] : fieldSwitches)
+        connect(findChild<QAbstractButton*>(QLatin1String(name)), &QAbstractButton::clicked, field,
+                [field = field] {
+                    if (field->isEnabled())
+                        field->setFocus();
+                });
+    for (QLineEdit* field : {m_ui->txtFPScustom, m_ui->lightGunFields[0], m_ui->lightGunFields[1],
                              m_ui->txtLineScan, m_ui->txtLowerSens, m_ui->txtScanLines})
         field->installEventFilter(this);
 
@@ -140,9 +141,9 @@ void frmSettings::RefreshOptionStates() {
     m_ui->txtLowerSens->setEnabled(states.lowerSensitivityField);
     m_ui->txtFPScustom->setEnabled(states.customFrameRateField);
     if (states.leftLayout)
-        m_ui->cmdLeftControlPic->setText(QLatin1String(states.leftLayout));
+        m_ui->pictureButtons[0]->setText(QLatin1String(states.leftLayout));
     if (states.rightLayout)
-        m_ui->cmdRightControlPic->setText(QLatin1String(states.rightLayout));
+        m_ui->pictureButtons[1]->setText(QLatin1String(states.rightLayout));
 
     const QString preview = launchSwitches(m_options).mid(1);
     if (m_ui->txtDOSOutput->text() != preview)
@@ -153,9 +154,9 @@ void frmSettings::RefreshOptionStates() {
 
 bool frmSettings::numberFieldEvent(QObject* watched, QEvent* event) {
     auto* field = qobject_cast<QLineEdit*>(watched);
-    if (field == nullptr || (field != m_ui->txtFPScustom && field != m_ui->txtLightGunCycles &&
-                             field != m_ui->txtLightGunScan && field != m_ui->txtLineScan &&
-                             field != m_ui->txtLowerSens && field != m_ui->txtScanLines))
+    const std::array fields = {m_ui->txtFPScustom, m_ui->lightGunFields[0], m_ui->lightGunFields[1],
+                               m_ui->txtLineScan,  m_ui->txtLowerSens,      m_ui->txtScanLines};
+    if (field == nullptr || std::find(fields.begin(), fields.end(), field) == fields.end())
         return false;
     switch (event->type()) {
     case QEvent::KeyPress:
@@ -302,7 +303,7 @@ QString frmSettings::GetPicName(const QString& cmdTxt) {
 }
 
 void frmSettings::showControlPic(bool bLeft) {
-    const QString caption = (bLeft ? m_ui->cmdLeftControlPic : m_ui->cmdRightControlPic)->text();
+    const QString caption = m_ui->pictureButtons[bLeft ? 0 : 1]->text();
     if (!m_picPreview)
         m_picPreview = new frmPicPreview(m_platform, this);
     // Says "Error loading pic" itself when the picture cannot be shown.

@@ -160,18 +160,18 @@ void frmSettings::createControlsPage() {
     auto* fraRightController = frame("fraRightController", "Select Controller On Right Port");
     tight(new QVBoxLayout(fraRightController))
         ->addWidget(list("comboRightController", kControllerEntries));
-    m_ui->cmdLeftControlPic = named(new QPushButton, "cmdLeftControlPic");
-    m_ui->cmdRightControlPic = named(new QPushButton, "cmdRightControlPic");
-    connect(m_ui->cmdLeftControlPic, &QPushButton::clicked, this, [this] { showControlPic(true); });
-    connect(m_ui->cmdRightControlPic, &QPushButton::clicked, this,
-            [this] { showControlPic(false); });
+    auto& pictures = m_ui->pictureButtons;
+    pictures = {named(new QPushButton, "cmdLeftControlPic"),
+                named(new QPushButton, "cmdRightControlPic")};
+    connect(pictures[0], &QPushButton::clicked, this, [this] { showControlPic(true); });
+    connect(pictures[1], &QPushButton::clicked, this, [this] { showControlPic(false); });
 
     auto* ports = new QGridLayout;
     ports->setVerticalSpacing(2);
     ports->addWidget(fraLeftController, 0, 0);
     ports->addWidget(fraRightController, 0, 1);
-    ports->addWidget(m_ui->cmdLeftControlPic, 1, 0);
-    ports->addWidget(m_ui->cmdRightControlPic, 1, 1);
+    ports->addWidget(pictures[0], 1, 0);
+    ports->addWidget(pictures[1], 1, 1);
     page->addLayout(ports);
 
     auto* fraInactiveControll = frame("fraInactiveControll", "Inactivate PC-controller");
@@ -189,12 +189,11 @@ void frmSettings::createControlsPage() {
 
     // Shown only while a port holds a light gun.
     m_ui->fraLightgun = frame("fraLightgun", "LightGun");
-    m_ui->txtLightGunCycles = numberField("txtLightGunCycles");
-    m_ui->txtLightGunScan = numberField("txtLightGunScan");
+    m_ui->lightGunFields = {numberField("txtLightGunCycles"), numberField("txtLightGunScan")};
     auto* lightgun = tight(new QHBoxLayout(m_ui->fraLightgun));
     for (QWidget* widget : std::initializer_list<QWidget*>{
-             label("lblLightGunAdjust", "Adjust by..."), m_ui->txtLightGunCycles,
-             label("lblLightGunCycles", "Cycles"), m_ui->txtLightGunScan,
+             label("lblLightGunAdjust", "Adjust by..."), m_ui->lightGunFields[0],
+             label("lblLightGunCycles", "Cycles"), m_ui->lightGunFields[1],
              label("lblLightGunScan", "Scanlines")})
         lightgun->addWidget(widget);
     lightgun->addStretch(1);
@@ -218,12 +217,12 @@ void frmSettings::createPaddlesAudioPage() {
                                                "in Paddle Emulation, and delay the paddle "
                                                "read-bit flipping by...");
     lblLowerSens->setWordWrap(true);
-    m_ui->chkLowerSens = check("chkLowerSens", "Enable");
+    auto* chkLowerSens = check("chkLowerSens", "Enable");
     m_ui->txtLowerSens = numberField("txtLowerSens");
     auto* lower = tight(new QVBoxLayout(fraLowerSens), 2);
     lower->addWidget(lblLowerSens);
     lower->addLayout(
-        row({m_ui->chkLowerSens, m_ui->txtLowerSens, label("lblLowerSensScan", "Scanlines")}));
+        row({chkLowerSens, m_ui->txtLowerSens, label("lblLowerSensScan", "Scanlines")}));
     page->addWidget(fraLowerSens);
 
     auto* fraSoundQueue = frame("fraSoundQueue", "Size of Sound Queue");
@@ -262,24 +261,24 @@ void frmSettings::createVideoPage() {
     auto* page = pageLayout(m_ui->pages[3]);
 
     auto* fraScanLines = frame("fraScanLines", "Scanlines");
-    m_ui->chkScanLines = check("chkScanLines", "Enabled");
+    auto* chkScanLines = check("chkScanLines", "Enabled");
     m_ui->txtScanLines = numberField("txtScanLines");
     auto* lblScanLines =
         label("lblScanLines", "Set the maximum number of scanlines to render (Height)");
     lblScanLines->setWordWrap(true);
     auto* scan = tight(new QHBoxLayout(fraScanLines), 8);
-    scan->addWidget(m_ui->chkScanLines);
+    scan->addWidget(chkScanLines);
     scan->addWidget(m_ui->txtScanLines);
     scan->addWidget(lblScanLines, 1);
     page->addWidget(fraScanLines);
 
     auto* fraFrameRate = frame("fraFrameRate", "Frame Rate");
-    m_ui->optFPScustom = option("optFPScustom", "Custom FPS");
+    auto* optFPScustom = option("optFPScustom", "Custom FPS");
     m_ui->txtFPScustom = numberField("txtFPScustom");
-    m_ui->optFPSmonitor = option("optFPSmonitor", "Monitor Speed");
+    auto* optFPSmonitor = option("optFPSmonitor", "Monitor Speed");
     tight(new QVBoxLayout(fraFrameRate))
-        ->addLayout(row({m_ui->optFPScustom, m_ui->txtFPScustom, m_ui->optFPSmonitor,
-                         option("optFPSDefault", "Default")}));
+        ->addLayout(row(
+            {optFPScustom, m_ui->txtFPScustom, optFPSmonitor, option("optFPSDefault", "Default")}));
 
     auto* fraNarrow = frame("fraNarrow", "Narrow Video Modes");
     tight(new QVBoxLayout(fraNarrow))
@@ -320,9 +319,9 @@ void frmSettings::createDebugPage() {
     page->setSpacing(2);
 
     auto* fraLineScan = frame("fraLineScan", "Start Scanning Game at Line...");
-    m_ui->chkLineScan = check("chkLineScan", "Enabled");
+    auto* chkLineScan = check("chkLineScan", "Enabled");
     m_ui->txtLineScan = numberField("txtLineScan");
-    tight(new QVBoxLayout(fraLineScan))->addLayout(row({m_ui->chkLineScan, m_ui->txtLineScan}));
+    tight(new QVBoxLayout(fraLineScan))->addLayout(row({chkLineScan, m_ui->txtLineScan}));
 
     auto* fraGameType = frame("fraGameType", "Override Game Type");
     tight(new QVBoxLayout(fraGameType))->addWidget(list("comboGT", kGameTypeEntries));

@@ -32,37 +32,33 @@ struct frmSettings::Ui {
     QComboBox* comboVideoMode = nullptr;
     QLineEdit* txtVidModeBalloon = nullptr;
 
-    QPushButton* cmdLeftControlPic = nullptr;
-    QPushButton* cmdRightControlPic = nullptr;
+    // The layout-picture buttons: left port, right port.
+    std::array<QPushButton*, 2> pictureButtons{};
     QGroupBox* fraPaddleSens = nullptr;
     // chkIPCKeyboard, chkIPCMouse, chkIPCJoystick, chkIPCStella, by PcDevice.
     std::array<QCheckBox*, 4> ipc{};
     QLineEdit* txtIPC4Balloon = nullptr;
     QGroupBox* fraLightgun = nullptr;
 
-    // The number fields, and the boxes or button that switch the first four on.
+    // The number fields that a box or button switches on, and the light gun's.
     QLineEdit* txtScanLines = nullptr;
     QLineEdit* txtLineScan = nullptr;
     QLineEdit* txtLowerSens = nullptr;
     QLineEdit* txtFPScustom = nullptr;
-    QLineEdit* txtLightGunCycles = nullptr;
-    QLineEdit* txtLightGunScan = nullptr;
-    QCheckBox* chkScanLines = nullptr;
-    QCheckBox* chkLineScan = nullptr;
-    QCheckBox* chkLowerSens = nullptr;
-    QRadioButton* optFPScustom = nullptr;
-    QRadioButton* optFPSmonitor = nullptr;
+    std::array<QLineEdit*, 2> lightGunFields{};
 
     vbalProgressBar* BarColorPaddle = nullptr;
     vbalProgressBar* BarColorPhos = nullptr;
     vbalProgressBar* BarColorSoundQueue = nullptr;
     QMenu* mnuSQPopup = nullptr;
 
+    // "Edit Switches" and the switches' preview.
     QCheckBox* chkDOSSwitch = nullptr;
     QLabel* lblDOSSwitchInstruction = nullptr;
     QLabel* lblDOSOutput = nullptr;
     QLineEdit* txtDOSOutput = nullptr;
 
+    // Default Paths page.
     QLineEdit* txtDefPathFilter = nullptr;
     QLineEdit* txtDefPathz26 = nullptr;
     QTreeWidget* vbalListDefPaths = nullptr;

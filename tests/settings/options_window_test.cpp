@@ -86,13 +86,11 @@ TEST_F(OptionControls, EachControlSpeaksThroughItsSwitch) {
         EXPECT_TRUE(previewHas(sw)) << name << ": " << preview().toStdString();
     }
     // The other buttons of a group take their switch away again.
-    for (const auto& [name, gone] : {std::pair{"optCPDefault", "-c"},
-                                     {"optDSPDefault", "-d"},
-                                     {"optNarrowNot", "-e"},
-                                     {"optSCPCX", "-B"},
-                                     {"optVMDefault", "-v"},
-                                     {"optPaddleM2None", "-m"},
-                                     {"optFPSDefault", "-r"}}) {
+    const std::pair<const char*, const char*> defaults[] = {
+        {"optCPDefault", "-c"}, {"optDSPDefault", "-d"}, {"optNarrowNot", "-e"},
+        {"optSCPCX", "-B"},     {"optVMDefault", "-v"},  {"optPaddleM2None", "-m"},
+        {"optFPSDefault", "-r"}};
+    for (const auto& [name, gone] : defaults) {
         get<QAbstractButton>(name)->click();
         EXPECT_FALSE(preview().contains(QLatin1String(gone))) << name;
     }
@@ -211,12 +209,10 @@ TEST_F(OptionControls, NumberFieldsTakeDigitsTidyUpAndAreSwitchedOnByTheirBoxes)
     }
     // Fields the emulator reads as numbers show their number at once; the others keep
     // what the user left, even nothing.
-    for (const auto& [name, shown] : {std::pair{"txtScanLines", "0"},
-                                      {"txtLineScan", "0"},
-                                      {"txtLightGunCycles", "0"},
-                                      {"txtLightGunScan", "0"},
-                                      {"txtLowerSens", ""},
-                                      {"txtFPScustom", ""}}) {
+    const std::pair<const char*, const char*> cleared[] = {
+        {"txtScanLines", "0"},    {"txtLineScan", "0"}, {"txtLightGunCycles", "0"},
+        {"txtLightGunScan", "0"}, {"txtLowerSens", ""}, {"txtFPScustom", ""}};
+    for (const auto& [name, shown] : cleared) {
         get<QLineEdit>(name)->clear();
         EXPECT_EQ(get<QLineEdit>(name)->text(), shown) << name;
     }

@@ -9,7 +9,6 @@
 #include <QFileInfo>
 #include <QGroupBox>
 #include <QHeaderView>
-#include <QKeySequence>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
@@ -32,24 +31,26 @@ QString quoted(const QString& text) {
     return u'"' + escaped + u'"';
 }
 
+QString listed(const QStringList& items, int current) {
+    return u'[' + items.join(QStringLiteral(" | ")) + QStringLiteral("] current ") +
+           QString::number(current);
+}
+
+void add(QString& line, bool bOn, const char* word) {
+    if (bOn)
+        line += u' ' + QLatin1String(word);
+}
+
 void dumpAction(const QAction& action, int depth, QStringList& lines) {
     if (action.objectName().isEmpty())
         return;
-    QString line = QString(depth * 2, u' ') + QStringLiteral("QAction ") + action.objectName();
-    if (action.isSeparator())
-        line += QStringLiteral(" separator");
-    else
-        line += u' ' + quoted(action.text());
-    if (!action.shortcut().isEmpty())
-        line += QStringLiteral(" shortcut ") + action.shortcut().toString();
-    if (action.isCheckable())
-        line += action.isChecked() ? QStringLiteral(" checked") : QStringLiteral(" unchecked");
-    if (!action.icon().isNull())
-        line += QStringLiteral(" icon");
-    if (!action.isEnabled())
-        line += QStringLiteral(" disabled");
-    if (!action.isVisible())
-        line += QStringLiteral(" hidden");
+    QString line = QString(depth * 2, u' ') + QStringLiteral("QAction ") + action.objectName() +
+                   u' ' +
+                   (action.isSeparator() ? QStringLiteral("separator") : quoted(action.text()));
+    add(line, action.isCheckable(), action.isChecked() ? "checked" : "unchecked");
+    add(line, !action.icon().isNull(), "icon");
+    add(line, !action.isEnabled(), "disabled");
+    add(line, !action.isVisible(), "hidden");
     lines << line;
     // A menu's items follow the action that opens it.
     if (const QMenu* menu = action.menu())
@@ -61,33 +62,26 @@ QString describe(const QWidget& w) {
     QString line = QString::fromLatin1(w.metaObject()->className()) + u' ' + w.objectName();
     if (w.isWindow() && !w.windowTitle().isEmpty())
         line += QStringLiteral(" title ") + quoted(w.windowTitle());
-    if (const auto* box = qobject_cast<const QGroupBox*>(&w))
+    if (const auto* box = qobject_cast<const QGroupBox*>(&w)) {
         line += u' ' + quoted(box->title());
-    else if (const auto* button = qobject_cast<const QAbstractButton*>(&w)) {
+    } else if (const auto* button = qobject_cast<const QAbstractButton*>(&w)) {
         line += u' ' + quoted(button->text());
-        if (button->isCheckable())
-            line += button->isChecked() ? QStringLiteral(" checked") : QStringLiteral(" unchecked");
+        add(line, button->isCheckable(), button->isChecked() ? "checked" : "unchecked");
     } else if (const auto* label = qobject_cast<const QLabel*>(&w)) {
         if (!label->text().isEmpty())
             line += u' ' + quoted(label->text());
     } else if (const auto* edit = qobject_cast<const QLineEdit*>(&w)) {
         line += u' ' + quoted(edit->text());
-        if (!edit->placeholderText().isEmpty())
-            line += QStringLiteral(" placeholder ") + quoted(edit->placeholderText());
     } else if (const auto* combo = qobject_cast<const QComboBox*>(&w)) {
         QStringList items;
         for (int i = 0; i < combo->count(); ++i)
             items << combo->itemText(i);
-        line += QStringLiteral(" [%1] current %2")
-                    .arg(items.join(QStringLiteral(" | ")))
-                    .arg(combo->currentIndex());
+        line += u' ' + listed(items, combo->currentIndex());
     } else if (const auto* tabs = qobject_cast<const QTabWidget*>(&w)) {
         QStringList captions;
         for (int i = 0; i < tabs->count(); ++i)
             captions << tabs->tabText(i);
-        line += QStringLiteral(" tabs [%1] current %2")
-                    .arg(captions.join(QStringLiteral(" | ")))
-                    .arg(tabs->currentIndex());
+        line += QStringLiteral(" tabs ") + listed(captions, tabs->currentIndex());
     } else if (const auto* view = qobject_cast<const QAbstractItemView*>(&w);
                view && view->model()) {
         // Column headers with their tool tips.
@@ -100,10 +94,8 @@ QString describe(const QWidget& w) {
     }
     if (!w.toolTip().isEmpty())
         line += QStringLiteral(" tip ") + quoted(w.toolTip());
-    if (w.testAttribute(Qt::WA_ForceDisabled))
-        line += QStringLiteral(" disabled");
-    if (w.isHidden() && !w.isWindow())
-        line += QStringLiteral(" hidden");
+    add(line, w.testAttribute(Qt::WA_ForceDisabled), "disabled");
+    add(line, w.isHidden() && !w.isWindow(), "hidden");
     return line;
 }
 
