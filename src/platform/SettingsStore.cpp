@@ -2,6 +2,7 @@
 
 #include <QLocale>
 
+#include <charconv>
 #include <cmath>
 #include <limits>
 
@@ -26,10 +27,6 @@ std::optional<qint64> tryParseLong(const QString& text) {
     return static_cast<qint64>(std::nearbyint(d));
 }
 
-qint64 parseLong(const QString& text, qint64 def) {
-    return tryParseLong(text).value_or(def);
-}
-
 bool parseBool(const QString& text, bool def) {
     const QString t = text.trimmed();
     if (t.compare(QLatin1String("True"), Qt::CaseInsensitive) == 0)
@@ -41,25 +38,6 @@ bool parseBool(const QString& text, bool def) {
     if (ok && std::isfinite(d))
         return d != 0.0;
     return def;
-}
-
-double readSingle(const SettingsStore& store, const QString& section, const QString& key,
-                  double def) {
-    return parseSingle(store.GetSetting(section, key, QString()), def);
-}
-
-qint64 readLong(const SettingsStore& store, const QString& section, const QString& key,
-                qint64 def) {
-    return parseLong(store.GetSetting(section, key, QString()), def);
-}
-
-bool readBool(const SettingsStore& store, const QString& section, const QString& key, bool def) {
-    return parseBool(store.GetSetting(section, key, QString()), def);
-}
-
-quint32 readColour(const SettingsStore& store, const QString& section, const QString& key,
-                   quint32 def) {
-    return parseColour(store.GetSetting(section, key, QString()), def);
 }
 
 quint32 parseColour(const QString& text, quint32 def) {
@@ -76,6 +54,10 @@ QString boolText(bool value) {
 }
 
 QString singleText(double value) {
-    // The shortest text that reads back as the same single-precision number.
-    return QString::number(static_cast<float>(value), 'g', QLocale::FloatingPointShortest);
+    // The shortest text that reads back as the same single-precision number: formatted as
+    // a float, not widened to a double first, which would add digits the single never had.
+    char text[32];
+    const std::to_chars_result end =
+        std::to_chars(text, text + sizeof text, static_cast<float>(value));
+    return QString::fromLatin1(text, end.ptr - text);
 }

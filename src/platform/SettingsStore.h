@@ -19,21 +19,13 @@ public:
     virtual bool DeleteSetting(const QString& section, const QString& key) = 0;
 };
 
-// Typed readers: a missing key, or stored text that does not convert, gives `def`.
+// Stored texts as typed values: text that does not convert gives `def`. (The keys and their
+// defaults are in StoredSettings.h.)
 std::optional<qint64> tryParseLong(const QString& text);
 double parseSingle(const QString& text, double def);
-qint64 parseLong(const QString& text, qint64 def);
 bool parseBool(const QString& text, bool def);
 // An OLE colour (0x00BBGGRR, or a system colour with the top bit set) as stored in decimal.
 quint32 parseColour(const QString& text, quint32 def);
-
-double readSingle(const SettingsStore& store, const QString& section, const QString& key,
-                  double def);
-qint64 readLong(const SettingsStore& store, const QString& section, const QString& key, qint64 def);
-bool readBool(const SettingsStore& store, const QString& section, const QString& key, bool def);
-// An OLE colour (0x00BBGGRR, or a system colour with the top bit set) as stored in decimal.
-quint32 readColour(const SettingsStore& store, const QString& section, const QString& key,
-                   quint32 def);
 
 // Texts in the forms the store uses.
 QString boolText(bool value);

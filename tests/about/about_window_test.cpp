@@ -1,14 +1,16 @@
 #include "support/Boxes.h"
+#include "support/Files.h"
 #include "support/LocalHttpServer.h"
+#include "support/Unreadable.h"
 #include "support/WidgetDump.h"
 
 #include "about/AboutArt.h"
-#include "about/AboutRules.h"
 #include "about/SysInfo.h"
+#include "about/UpdateDescription.h"
 #include "about/frmAbout.h"
 #include "ui/Twips.h"
 
-#include <QFileInfo>
+#include <QBuffer>
 #include <QLabel>
 #include <QPointer>
 #include <QPushButton>
@@ -21,164 +23,286 @@
 namespace {
 
 const QString kProduct = QStringLiteral("lum (Windows Front End for z26)");
-const QString kMsinfoKey = QString::fromLatin1(kSysInfoPathKey);
-const QColor kCyan(0, 255, 255), kHover(78, 136, 255);
+const QByteArray kHeader = "::lum (Windows Front End for z26)\r\n";
+const std::string kAsk = "Update available | Version 1.1.13 released June 2nd is available.\n\n"
+                         "Do you wish to update now? | YesNoCancel | None\n";
+const std::string kFailedCheck = "Update Check Failed | ";
 
-QColor textColour(const QLabel* label) {
-    return label->palette().color(QPalette::WindowText);
+// The section read from `content` as one line: status, then every field in file order.
+std::string read(QByteArray content, bool forumOnly = false) {
+    QBuffer buffer(&content);
+    buffer.open(QIODevice::ReadOnly);
+    const UpdateSection s = readUpdateSection(buffer, kProduct, forumOnly);
+    static const char* const statuses[] = {"NotFound", "Complete", "Truncated", "BadVersion"};
+    const QStringList fields = {s.forumUrl,    s.message,      QString::number(s.availableVersion),
+                                s.releaseDate, s.installerUrl, s.installerFileName,
+                                s.runFlag};
+    return statuses[static_cast<int>(s.status)] + (" | " + fields.join(" | ")).toStdString();
 }
 
-void moveMouse(QWidget* widget, QPoint position) {
-    QMouseEvent move(QEvent::MouseMove, position, widget->mapToGlobal(position), Qt::NoButton,
-                     Qt::NoButton, Qt::NoModifier);
-    QApplication::sendEvent(widget, &move);
+TEST(UpdateDescription, VersionNumbers) {
+    EXPECT_EQ(parseVersionNumber(QStringLiteral(" 1049613\t")), 1049613);
+    for (const char* bad :
+         {"", "1.1.13", "+5", "-5", "12abc", "1 2", "99999999999999999999999", "\u0661\u0662"})
+        EXPECT_FALSE(parseVersionNumber(QString::fromUtf8(bad))) << bad;
 }
 
-class AboutWindowTest : public ::testing::Test {
+TEST(UpdateDescription, HeadersAndInstallerNames) {
+    EXPECT_TRUE(isSectionHeader("::" + kProduct, kProduct));
+    for (const QString& other : {"::" + kProduct.toUpper(), "::" + kProduct + " ", ":: " + kProduct,
+                                 "x::" + kProduct, kProduct})
+        EXPECT_FALSE(isSectionHeader(other, kProduct)) << other.toStdString();
+    // Short lines never qualify, not even for an empty name.
+    EXPECT_FALSE(isSectionHeader(QStringLiteral("::"), QString()));
+
+    for (const char* good : {"setup.exe", "lum-1.1.13.run", "a b.bin"})
+        EXPECT_TRUE(isSafeInstallerFileName(QString::fromUtf8(good))) << good;
+    for (const char* bad : {"", " ", ".", "..", "../setup.exe", "/tmp/setup.exe", "sub/setup.exe",
+                            "..\\setup.exe", "C:\\setup.exe", "bad\nname"})
+        EXPECT_FALSE(isSafeInstallerFileName(QString::fromUtf8(bad))) << bad;
+}
+
+// The forum line alone in forum mode, every line otherwise; CR LF or LF; after 8 MiB of
+// other sections.
+TEST(UpdateDescription, FindsTheSection) {
+    const QByteArray file = "::Other Program\r\nhttps://other\r\n2098176\r\n" + kHeader +
+                            "https://example.org/forum/lum\r\n1049613\r\nMay 1st\r\n"
+                            "https://example.org/setup.exe\r\nsetup.exe\r\n1\r\nafter the flag\r\n";
+    const QByteArray others =
+        QByteArray("::Some other product\r\nhttps://example.org/other\r\n'a message\r\n")
+            .repeated(120000);
+    const std::tuple<QByteArray, bool, std::string> rows[] = {
+        {file, false,
+         "Complete | https://example.org/forum/lum |  | 1049613 | May 1st | "
+         "https://example.org/setup.exe | setup.exe | 1"},
+        {file, true, "Complete | https://example.org/forum/lum |  | 0 |  |  |  | "},
+        {others + "::lum (Windows Front End for z26)\nf\n'Hello\n'World\n1049613\nd\nu\nn\n0\n",
+         false, "Complete | f | \nHello\nWorld\n | 1049613 | d | u | n | 0"},
+        {kHeader + "f\r\n'note\r\n1.1.13\r\nd\r\n", false,
+         "BadVersion | f | \nnote\n | 0 |  |  |  | "},
+        {kHeader, true, "Truncated |  |  | 0 |  |  |  | "},
+    };
+    for (const auto& [content, forumOnly, section] : rows)
+        EXPECT_EQ(read(content, forumOnly), section) << content.left(80).toStdString();
+    // No section for this product: nothing, binary noise, one line of 8 MiB, a NUL after the
+    // name, other sections only.
+    const QByteArray none[] = {{},
+                               QByteArray("\0\xff\r::\x80\r\n\x01:\n", 11),
+                               QByteArray(8 * 1024 * 1024, 'x'),
+                               QByteArray("::lum (Windows Front End for z26)\0\r\n", 36),
+                               file.left(file.indexOf("::lum"))};
+    for (const QByteArray& content : none)
+        for (const bool forumOnly : {false, true})
+            EXPECT_EQ(read(content, forumOnly), "NotFound |  |  | 0 |  |  |  | ")
+                << content.left(80).toStdString();
+
+    // Cut after any line of the section, it is incomplete.
+    const QByteArray full = kHeader + "f\r\n'note\r\n1049613\r\ndate\r\nurl\r\nname\r\n0\r\n";
+    for (qsizetype end = full.indexOf("\r\n"); end + 2 < full.size();
+         end = full.indexOf("\r\n", end + 2))
+        EXPECT_EQ(read(full.left(end + 2)).substr(0, 9), "Truncated") << end;
+}
+
+class About : public ::testing::Test {
 protected:
     FakePlatform fake;
     LocalHttpServer server;
     QPointer<frmAbout> window = new frmAbout(fake.platform, nullptr, server.base());
+    QSignalSpy ends{window.data(), &frmAbout::endProgramRequested};
 
-    ~AboutWindowTest() override { delete window.data(); }
+    ~About() override { delete window.data(); }
+
+    // What the user saw and the program did since the last call, a line each: boxes, pages
+    // and folders opened, programs started, the program ended.
+    std::string happened() {
+        std::string out;
+        for (const std::string& box : boxLines(fake.dialogs))
+            out += box + '\n';
+        for (const QString& url : fake.shell.urls)
+            out += "open " + url.toStdString() + '\n';
+        for (const QString& folder : fake.shell.folders)
+            out += "show " + folder.toStdString() + '\n';
+        for (const FakeShell::Start& s : fake.shell.started)
+            out +=
+                "start " + (QStringList{s.program} + s.arguments).join(u' ').toStdString() + '\n';
+        if (!ends.isEmpty())
+            out += "end program\n";
+        ends.clear();
+        fake.dialogs.boxes.clear();
+        fake.shell = FakeShell(); // forgets, and works again
+        return out;
+    }
+    // Clicks Forum or Update with `description` on the server (an empty one is not found).
+    // A box that is not scripted answers with its first button.
+    std::string check(bool forum, const QByteArray& description, MsgResult answer) {
+        server.responses["/programs/update.txt"] = {
+            description.isEmpty() ? 404 : 200, description, {}, false, -1};
+        fake.dialogs.answers = {answer};
+        QTest::mouseClick(forum ? window->cmdForum : window->cmdUpdate, Qt::LeftButton);
+        return happened();
+    }
+    // A description file with this product's section.
+    QByteArray section(const QByteArray& version, const QByteArray& messages = {},
+                       const QByteArray& fileName = "setup.run", const QByteArray& run = "0") {
+        return kHeader + "https://example.org/forum/lum\r\n" + messages + version +
+               "\r\nJune 2nd\r\n" + server.base().toUtf8() + "/files/setup.run\r\n" + fileName +
+               "\r\n" + run + "\r\n";
+    }
 };
 
-TEST(AboutRulesTest, ShrinkToFitAndTiles) {
-    QFont font(QStringLiteral("Arial"));
-    font.setBold(true);
-    font.setPointSizeF(29.25);
-    auto width = [font](double points) mutable {
-        font.setPointSizeF(points);
-        return QFontMetrics(font).horizontalAdvance(kProduct);
-    };
-    const double fitted = shrinkToFit(font, kProduct, 327);
-    EXPECT_DOUBLE_EQ(fitted - std::floor(fitted), 0.25); // whole points off 29.25
-    EXPECT_LE(width(fitted), 327);
-    EXPECT_GT(width(fitted + 1), 327);
-    EXPECT_DOUBLE_EQ(shrinkToFit(font, QStringLiteral("lum"), 327), 29.25);
-    EXPECT_DOUBLE_EQ(shrinkToFit(font, kProduct, 0), 1.0); // stops instead of looping
-
-    // Column by column, both bounds inclusive.
-    EXPECT_EQ(tileOrigins(QSize(300, 100), QSize(128, 96)),
-              (std::vector<QPoint>{{0, 0}, {0, 96}, {128, 0}, {128, 96}, {256, 0}, {256, 96}}));
-    EXPECT_EQ(tileOrigins(QSize(256, 96), QSize(128, 96)).size(), 6u);
-    EXPECT_TRUE(tileOrigins(QSize(300, 100), QSize(0, 96)).empty());
-}
-
-TEST_F(AboutWindowTest, GetKeyValue) {
-    const std::pair<RegistryValue, std::optional<QString>> values[] = {
-        {{kRegNumber, QByteArray("\x78\x56\x34\x12", 4)}, "&h12345678"}, // last byte first
-        {{kRegNumber, QByteArray("\x0F\x0A\x00\x00", 4)}, "&hA0F"},      // inner zeros kept
-        {{kRegString, QByteArray("/usr/bin/hardinfo\0junk", 22)}, "/usr/bin/hardinfo"},
-        {{3, QByteArray("\x01", 1)}, std::nullopt}, // no text form
-    };
-    for (const auto& [value, text] : values)
-        EXPECT_EQ(registryValueText(value), text) << value.data.toHex().constData();
-    fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "Blob", values[3].first);
-    QString value = QStringLiteral("before");
-    EXPECT_TRUE(window->GetKeyValue(kHkeyLocalMachine, kMsinfoKey, "Blob", value));
-    EXPECT_EQ(value, "before"); // left alone
-    EXPECT_FALSE(window->GetKeyValue(0x80000001u, kMsinfoKey, "PATH", value));
-    EXPECT_EQ(value, "");
-}
-
-TEST_F(AboutWindowTest, SystemInformation) {
+TEST_F(About, SystemInformation) {
     fake.writeFile("msinfo/MSINFO32.EXE");
-    fake.makeFolder("empty");
-    const std::string none = "lum | System Information Is Unavailable At This Time | Ok | None";
+    const std::string none = "lum | System Information Is Unavailable At This Time | Ok | None\n";
     // The registered tool, the registered folder, whether starting works: what happens.
     const std::tuple<QString, QString, bool, std::string> rows[] = {
-        {"/usr/bin/hardinfo", "msinfo", true, "start /usr/bin/hardinfo"},
-        {"/usr/bin/hardinfo", "", false, none},
-        {"", "msinfo", true, "start " + fake.root().toStdString() + "/msinfo/MSINFO32.EXE"},
-        {"", "empty", true, none},
-        {"", "", true, none},
+        {"/usr/bin/hardinfo", "msinfo", true, "start /usr/bin/hardinfo\n"},
+        {"/usr/bin/hardinfo", "", false, none + "start /usr/bin/hardinfo\n"},
+        {"", "msinfo", true, "start " + fake.root().toStdString() + "/msinfo/MSINFO32.EXE\n"},
+        {"", "gone", true, none},
     };
     for (const auto& [path, folder, works, did] : rows) {
         fake.registry.values.clear();
         if (!path.isEmpty())
-            fake.registry.set(kHkeyLocalMachine, kMsinfoKey, "PATH", {kRegString, path.toUtf8()});
+            fake.registry.set(kHkeyLocalMachine, kSysInfoPathKey, "PATH",
+                              {kRegString, path.toUtf8()});
         if (!folder.isEmpty())
-            fake.registry.set(kHkeyLocalMachine, QString::fromLatin1(kSysInfoFolderKey), "MSINFO",
+            fake.registry.set(kHkeyLocalMachine, kSysInfoFolderKey, "MSINFO",
                               {kRegString, (fake.root() + u'/' + folder).toUtf8() + '\0'});
         fake.shell.succeed = works;
         QTest::mouseClick(window->cmdSysInfo, Qt::LeftButton);
-        Lines lines = boxLines(fake.dialogs);
-        if (works && !fake.shell.started.empty())
-            lines.push_back("start " + fake.shell.started.back().program.toStdString());
-        EXPECT_EQ(lines, Lines{did});
-        fake.dialogs.boxes.clear();
-        fake.shell.started.clear();
+        EXPECT_EQ(happened(), did);
     }
 }
 
-TEST_F(AboutWindowTest, GoldenTextsColoursAndATiledBackground) {
+// The texts and colours; the product name as large as fits its place; background tiles
+// all over: the top strip and the left edge show tiles only, the last ones cut.
+TEST_F(About, GoldenTextsColoursAndATiledBackground) {
     QString dump = dumpWidgetTree(*window);
     for (const QLabel* label : window->findChildren<QLabel*>())
         if (!label->text().isEmpty())
-            dump +=
-                label->objectName() + QStringLiteral(" colour ") + textColour(label).name() + u'\n';
+            dump += label->objectName() + " colour " +
+                    label->palette().color(QPalette::WindowText).name() + u'\n';
     expectGolden("frmAbout", dump);
-    EXPECT_LT(window->lblProgram->font().pointSizeF(), 29.25);
-    EXPECT_LE(QFontMetrics(window->lblProgram->font()).horizontalAdvance(kProduct),
-              twips::toPixelsX(4900));
+    QFont font = window->lblProgram->font();
+    EXPECT_LE(QFontMetrics(font).horizontalAdvance(kProduct), twips::toPixelsX(4900));
+    font.setPointSizeF(font.pointSizeF() + 1);
+    EXPECT_GT(QFontMetrics(font).horizontalAdvance(kProduct), twips::toPixelsX(4900));
 
     window->show();
     const QImage shot = window->grab().toImage().convertToFormat(QImage::Format_RGB32);
     const QImage tile = aboutBackgroundTile();
     ASSERT_GT(shot.width(), 2 * tile.width());
-    // The top strip and the left edge hold no control: tiles only, the last ones cut.
     for (int x = 0; x < shot.width(); ++x)
         ASSERT_EQ(shot.pixel(x, 3), tile.pixel(x % tile.width(), 3)) << x;
     for (int y = 0; y < shot.height(); ++y)
         ASSERT_EQ(shot.pixel(3, y), tile.pixel(3, y % tile.height())) << y;
 }
 
-TEST_F(AboutWindowTest, EmailHoverAndLinks) {
+// The address lights up under the mouse until it moves onto the window's own surface; the
+// links open their pages; OK closes the window as the close box does, which deletes it.
+TEST_F(About, EmailHoverLinksAndOk) {
     window->show(); // lays the controls out
-    moveMouse(window->lblEmail, QPoint(2, 2));
-    EXPECT_EQ(textColour(window->lblEmail), kHover);
-    moveMouse(window, window->cmdOK->geometry().center()); // over another control: no change
-    EXPECT_EQ(textColour(window->lblEmail), kHover);
-    moveMouse(window, QPoint(2, 2)); // the window's own surface
-    EXPECT_EQ(textColour(window->lblEmail), kCyan);
+    const auto moveTo = [this](QWidget* widget, QPoint position) {
+        QTest::mouseMove(widget, position);
+        return window->lblEmail->palette().color(QPalette::WindowText).name();
+    };
+    EXPECT_EQ(moveTo(window->lblEmail, QPoint(2, 2)), "#4e88ff");
+    EXPECT_EQ(moveTo(window, window->cmdOK->geometry().center()), "#4e88ff");
+    EXPECT_EQ(moveTo(window, QPoint(2, 2)), "#00ffff");
 
     for (QWidget* link :
          std::initializer_list<QWidget*>{window->lblEmail, window->cmdWeb, window->cmdDonate})
         QTest::mouseClick(link, Qt::LeftButton);
-    EXPECT_EQ(
-        fake.shell.urls,
-        (QStringList{"mailto:support@lum.example.org?Subject=" + kProduct + " v1.1.12 Question",
-                     "https://lum.example.org/",
-                     "https://www.paypal.com/xclick/business=donate%40lum.example.org"
-                     "&item_name=lum.example.org&no_note=1&tax=0&currency_code=USD"}));
+    EXPECT_EQ(happened(), "open mailto:support@lum.example.org?Subject=" + kProduct.toStdString() +
+                              " v1.1.12 Question\nopen https://lum.example.org/\n"
+                              "open https://www.paypal.com/xclick/business=donate%40lum.example.org"
+                              "&item_name=lum.example.org&no_note=1&tax=0&currency_code=USD\n");
+    QTest::mouseClick(window->cmdOK, Qt::LeftButton);
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    EXPECT_TRUE(window.isNull());
 }
 
-// After a forum lookup, whatever its outcome, the Update button checks for updates.
-TEST_F(AboutWindowTest, ForumThenUpdateAndAnInstallerThatEndsTheProgram) {
-    server.serve("/programs/update.txt",
-                 "::lum (Windows Front End for z26)\r\nhttps://example.org/forum/lum\r\n"
-                 "1049613\r\nJune 2nd\r\n" +
-                     server.base().toUtf8() + "/setup.run\r\nsetup.run\r\n1\r\n");
-    server.serve("/setup.run", "INSTALLER");
-    QTest::mouseClick(window->cmdForum, Qt::LeftButton);
-    EXPECT_EQ(fake.shell.urls, QStringList{"https://example.org/forum/lum"});
-    EXPECT_FALSE(window->m_bForumRequest);
+// Everything short of a download: nothing is fetched and nothing made but the local copy.
+// After a forum lookup, whatever its outcome, Update checks for updates.
+TEST_F(About, WhatEachDescriptionLeadsTo) {
+    const std::string forum = "open " + server.base().toStdString() + "/forum\n";
+    const std::tuple<bool, QByteArray, MsgResult, std::string> rows[] = {
+        {true, QByteArray(), MsgResult::Ok,
+         kFailedCheck + "Failed to connect to the internet | Ok | Information\n"},
+        {false, section("1049612", "'Hello\r\n'World\r\n"), MsgResult::Ok,
+         "Update Message | \nHello\nWorld\n | Ok | Information\nNo update needed | You have the "
+         "current version 1.1.12 Released June 2nd\nNo update is needed | Ok | None\n"},
+        {true, section("1049612"), MsgResult::Ok, "open https://example.org/forum/lum\n"},
+        {true, kHeader + "file:///etc/passwd\r\n", MsgResult::Ok, forum}, // web pages only
+        {true, "::Other\r\n", MsgResult::Ok, forum},
+        {false, "::Other\r\n", MsgResult::Ok,
+         "No updates available | No Updates Found | Ok | None\n"},
+        {false, section("1049611"), MsgResult::Ok,
+         "No update needed | Huh, that's odd... \nThis Version is newer that what's available\n"
+         "on the internet. | Ok | None\n"},
+        {false, section("1049613"), MsgResult::No, kAsk},
+        {false, section("1049613"), MsgResult::Cancel, kAsk},
+        {false, kHeader + "f\r\n", MsgResult::Ok,
+         kFailedCheck + "The update information is incomplete. | Ok | Information\n"},
+        {false, kHeader + "f\r\n1.1.13\r\n", MsgResult::Ok,
+         kFailedCheck + "The update information holds no valid version. | Ok | Information\n"},
+        {false, section("1049613", {}, "../setup.run"), MsgResult::Yes,
+         kFailedCheck + "The update names an installer file that cannot be accepted: "
+                        "\"../setup.run\" | Ok | Information\n"},
+    };
+    for (const auto& [forumMode, description, answer, did] : rows)
+        EXPECT_EQ(check(forumMode, description, answer), did) << description.toStdString();
+    EXPECT_FALSE(server.requests.contains("/files/setup.run"));
+    EXPECT_EQ(folderEntries(fake.programFolder()), QStringList{"tmp"});
+}
 
-    QSignalSpy ended(window.data(), &frmAbout::endProgramRequested);
-    QTest::mouseClick(window->cmdUpdate, Qt::LeftButton);
-    EXPECT_EQ(ended.count(), 1);
-    EXPECT_EQ(fake.shell.started.size(), 1u);
-    EXPECT_FALSE(QFileInfo::exists(fake.iniPath())); // nothing saved
-
-    server.fail("/programs/update.txt", 404);
-    QTest::mouseClick(window->cmdForum, Qt::LeftButton);
-    EXPECT_FALSE(window->m_bForumRequest);
-    EXPECT_EQ(fake.shell.urls.size(), 1);
+// Run flag 1 starts the installer and ends the program, unless it will not start. A failed
+// download leaves the Update folder as it was. A read-only program folder (an installed
+// copy) keeps the description elsewhere, so the check still works.
+TEST_F(About, Downloads) {
+    enum Limit { None, WontStart, ReadOnly };
+    const QString program = fake.programFolder(), update = program + "/Update";
+    const std::string installer = update.toStdString() + "/setup.run";
+    const std::string kept = "Download Complete | The update has been downloaded to " + installer +
+                             "\n | Ok | Information\nshow " + program.toStdString() + '\n';
+    const std::string start =
+        "start " + installer + " /SP- /silent /noicons /dir=" + program.toStdString() + '\n';
+    const std::string failed = "Download Failed | Failed to Download Update | Ok | None\n";
+    const auto writable = QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner;
+    // What was there, what the server has (none: not found), the run flag: what happens,
+    // then the Update folder's entries and the installer's bytes.
+    const std::tuple<const char*, const char*, QByteArray, Limit, std::string> rows[] = {
+        {"OLD", "NEW", "0", None, kAsk + kept + "setup.run NEW"},
+        {"OLD", "NEW", "1", None, kAsk + start + "end program\nsetup.run NEW"},
+        {nullptr, "NEW", "1", WontStart, kAsk + kept + start + "setup.run NEW"},
+        {nullptr, nullptr, "0", None, kAsk + failed + " <unreadable>"},
+        {"OLD", "", "0", None, kAsk + failed + "setup.run OLD"},
+        {nullptr, "NEW", "0", ReadOnly, kAsk + failed + " <unreadable>"},
+        {"/", "NEW", "0", None, kAsk + failed + "setup.run <unreadable>"}, // a folder in its place
+    };
+    for (const auto& [before, body, runFlag, limit, did] : rows) {
+        QFile::setPermissions(program, writable);
+        QDir(update).removeRecursively();
+        if (before && *before == '/')
+            fake.makeFolder("program/Update/setup.run");
+        else if (before)
+            fake.writeFile("program/Update/setup.run", before);
+        server.responses["/files/setup.run"] = {body ? 200 : 404, body, {}, false, -1};
+        fake.shell.succeed = limit != WontStart;
+        QFile::setPermissions(program,
+                              limit == ReadOnly ? QFile::ReadOwner | QFile::ExeOwner : writable);
+        const NoPermissionOverride asAnyone;
+        ASSERT_TRUE(asAnyone.holds());
+        std::string seen =
+            check(false, section("1049613", {}, "setup.run", runFlag), MsgResult::Yes);
+        seen += folderEntries(update).join(u' ').toStdString() + ' ';
+        EXPECT_EQ(seen + fileBytes(update + "/setup.run").toStdString(), did);
+        EXPECT_TRUE(runFlag == "0" || QFileInfo(update + "/setup.run").isExecutable());
+    }
 }
 
 // Closing it while a download waits would delete it under the check.
-TEST_F(AboutWindowTest, StaysOpenWhileADownloadWaits) {
+TEST_F(About, StaysOpenWhileADownloadWaits) {
     QtDownloader impatient{std::chrono::milliseconds(300)};
     Platform platform{fake.store,           fake.dialogs, fake.shell,
                       fake.programFolder(), impatient,    fake.registry};
@@ -192,14 +316,6 @@ TEST_F(AboutWindowTest, StaysOpenWhileADownloadWaits) {
     EXPECT_TRUE(busy->isVisible());
     EXPECT_EQ(fake.dialogs.boxes.size(), 1u); // the failed check, shown over a live window
     delete busy.data();
-}
-
-// OK closes it as the close box does, and closing deletes it.
-TEST_F(AboutWindowTest, OkClosesAndDeletesIt) {
-    window->show();
-    QTest::mouseClick(window->cmdOK, Qt::LeftButton);
-    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    EXPECT_TRUE(window.isNull());
 }
 
 } // namespace

@@ -13,6 +13,7 @@
 #include <deque>
 #include <memory>
 #include <optional>
+#include <tuple>
 #include <vector>
 
 // Dialogs that answer from scripts and record every box they were asked to show.
@@ -31,11 +32,17 @@ public:
 
     MsgResult MsgBox(QWidget* owner, const QString& text, MsgButtons buttons, MsgIcon icon,
                      const QString& title) override;
-    QString ShowOpen(QWidget* owner, const FileDialogRequest& request) override;
-    QString ShowSave(QWidget* owner, const FileDialogRequest& request) override;
-    QString ShowFolder(QWidget* owner, const QString& title, const QString& initialFolder) override;
-    std::optional<quint32> ShowColor(QWidget* owner, const QString& title,
-                                     quint32 initialColour) override;
+    QString ShowOpen(QWidget*, const FileDialogRequest& r) override { return path(false, r); }
+    QString ShowSave(QWidget*, const FileDialogRequest& r) override { return path(true, r); }
+    QString ShowFolder(QWidget*, const QString& title, const QString&) override {
+        folderTitles << title;
+        return next(paths, QString());
+    }
+    std::optional<quint32> ShowColor(QWidget*, const QString& title, quint32 initial) override {
+        colourTitles << title;
+        colourInitials.push_back(initial);
+        return next(colours, std::optional<quint32>());
+    }
 
     // Scripted answers, used in order; when a queue is empty a box answers with its
     // first button and a chooser is cancelled.
@@ -48,6 +55,19 @@ public:
     QStringList folderTitles;
     QStringList colourTitles;
     std::vector<quint32> colourInitials;
+
+private:
+    template <class T> static T next(std::deque<T>& queue, T empty) {
+        if (queue.empty())
+            return empty;
+        T front = std::move(queue.front());
+        queue.pop_front();
+        return front;
+    }
+    QString path(bool bSave, const FileDialogRequest& request) {
+        fileRequests.push_back({bSave, request});
+        return next(paths, QString());
+    }
 };
 
 // A shell that starts nothing and records every call.
@@ -59,32 +79,42 @@ public:
         QString workingFolder;
     };
     bool StartProgram(const QString& program, const QStringList& arguments,
-                      const QString& workingFolder) override;
-    bool OpenUrl(const QString& url) override;
-    bool OpenTextFile(const QString& path) override;
-    bool OpenFolder(const QString& path) override;
+                      const QString& workingFolder) override {
+        started.push_back({program, arguments, workingFolder});
+        return succeed;
+    }
+    bool OpenUrl(const QString& url) override { return record(urls, url); }
+    bool OpenTextFile(const QString& path) override { return record(textFiles, path); }
+    bool OpenFolder(const QString& path) override { return record(folders, path); }
 
     bool succeed = true;
     std::vector<Start> started;
     QStringList urls;
     QStringList textFiles;
     QStringList folders;
+
+private:
+    bool record(QStringList& calls, const QString& call) {
+        calls << call;
+        return succeed;
+    }
 };
 
-// A registry that answers from a script and records every lookup.
+// A registry that answers from a script: one value under a key and name.
 class FakeRegistry final : public Registry {
 public:
-    struct Lookup {
-        quint32 root;
-        QString keyName;
-        QString valueName;
-    };
     std::optional<RegistryValue> QueryValue(quint32 root, const QString& keyName,
-                                            const QString& valueName) override;
-    void set(quint32 root, const QString& keyName, const QString& valueName, RegistryValue value);
+                                            const QString& valueName) override {
+        for (const auto& [where, value] : values)
+            if (where == std::tuple{root, keyName, valueName})
+                return value;
+        return std::nullopt;
+    }
+    void set(quint32 root, const QString& keyName, const QString& valueName, RegistryValue value) {
+        values.push_back({{root, keyName, valueName}, std::move(value)});
+    }
 
-    std::vector<std::pair<Lookup, RegistryValue>> values;
-    std::vector<Lookup> lookups;
+    std::vector<std::pair<std::tuple<quint32, QString, QString>, RegistryValue>> values;
 };
 
 // A whole fake platform over a temporary folder: the store is a real INI file in it and
