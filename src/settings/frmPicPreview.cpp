@@ -4,30 +4,15 @@
 #include "platform/Platform.h"
 #include "platform/StoredSettings.h"
 #include "settings/PictureFit.h"
+#include "ui/PictureFile.h"
 #include "ui/Twips.h"
 
 #include <QCloseEvent>
-#include <QFileInfo>
-#include <QImageReader>
 #include <QLabel>
 #include <QPixmap>
 
 #include <algorithm>
 #include <cmath>
-
-namespace {
-
-// The picture in the file, or a null pixmap when there is none to be had.
-QPixmap loadPicture(const QString& path) {
-    // Only regular files: a folder is no picture, and a pipe could block the reader.
-    if (!QFileInfo(path).isFile())
-        return {};
-    QImageReader reader(path);
-    reader.setAutoTransform(true);
-    return QPixmap::fromImage(reader.read());
-}
-
-} // namespace
 
 frmPicPreview::frmPicPreview(Platform& platform, QWidget* owner)
     : QWidget(owner, Qt::Window), m_platform(platform) {
@@ -56,7 +41,7 @@ frmPicPreview::frmPicPreview(Platform& platform, QWidget* owner)
 }
 
 bool frmPicPreview::showPicture(const QString& path, const QString& caption) {
-    const QPixmap picture = loadPicture(path);
+    const QPixmap picture = QPixmap::fromImage(loadPictureFile(path));
     if (picture.isNull()) {
         m_platform.dialogs.MsgBox(this, QStringLiteral("Error loading pic"), MsgButtons::Ok,
                                   MsgIcon::Exclamation, QStringLiteral("Error"));

@@ -1,9 +1,16 @@
+#include "support/Files.h"
+#include "support/Unreadable.h"
+
+#include "ui/PictureFile.h"
 #include "ui/Twips.h"
 
 #include <QGuiApplication>
 #include <QScreen>
+#include <QTemporaryDir>
 
 #include <cmath>
+
+#include <sys/stat.h>
 
 #include <gtest/gtest.h>
 
@@ -22,4 +29,31 @@ TEST(BadInputTwips, AbsurdValuesStayWithinTheDesktop) {
     // Ordinary values are untouched: 1440 twips to the inch.
     EXPECT_EQ(twips::toPixelsX(4905), std::lround(4905 * screen->logicalDotsPerInchX() / 1440));
     EXPECT_EQ(twips::toPixelsY(-500), std::lround(-500 * screen->logicalDotsPerInchY() / 1440));
+}
+
+// Background and controller pictures: whatever is at the path, a picture or none.
+TEST(BadInputPictures, AnythingButAPictureOfModestSizeGivesNone) {
+    QTemporaryDir dir;
+    const auto file = [&dir](const char* name, const QByteArray& bytes) {
+        putFile(dir.filePath(name), bytes);
+        return dir.filePath(name);
+    };
+    // A JPEG whose header claims 60000 x 60000, its data cut.
+    QByteArray huge = encodedPicture(8, 8, "JPG");
+    const qsizetype frame = huge.indexOf("\xFF\xC0");
+    huge = huge.left(frame + 40).replace(frame + 5, 4, "\xEA\x60\xEA\x60");
+    ASSERT_EQ(::mkfifo(QFile::encodeName(dir.filePath("fifo.jpg")).constData(), 0600), 0);
+    QDir(dir.path()).mkdir("folder.jpg");
+    const QString none[] = {QString(),
+                            dir.filePath("missing.jpg"),
+                            file("empty.jpg", {}),
+                            file("cut.jpg", encodedPicture(64, 64, "JPG").left(100)),
+                            file("huge.jpg", huge),
+                            file("garbage.jpg", "\xFF\xD8junk"),
+                            makeUnreadable(dir.filePath("locked.jpg"), encodedPicture(8, 8, "PNG")),
+                            dir.filePath("folder.jpg"),
+                            dir.filePath("fifo.jpg")};
+    for (const QString& path : none)
+        EXPECT_TRUE(loadPictureFile(path).isNull()) << qPrintable(path);
+    EXPECT_EQ(loadPictureFile(file("ok.png", encodedPicture(9, 7, "PNG"))).size(), QSize(9, 7));
 }
