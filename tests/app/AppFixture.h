@@ -1,47 +1,47 @@
 #pragma once
 
 #include "support/Boxes.h"
-#include "support/FakePlatform.h"
 #include "support/WidgetDump.h"
 
+#include "about/frmAbout.h"
 #include "app/frmMain.h"
 #include "library/RomListModel.h"
 #include "settings/frmSettings.h"
 #include "ui/ListView.h"
 #include "ui/cTextBoxXP.h"
+#include "ui/vbalProgressBar.h"
 
 #include <QAction>
+#include <QApplication>
+#include <QFile>
+#include <QGroupBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QTest>
 
 #include <gtest/gtest.h>
 
 #include <memory>
 
-// A main window over a fake platform, with helpers to lay out the store and the ROM
-// folders and to reach the windows' controls by name.
+// A main window over a fake platform; helpers lay out the store and tell what happened.
 class AppFixture : public ::testing::Test {
 protected:
-    // Stores ROM folder entry n (counted from 1) with its flag, by the keys' names.
-    void storeFolder(int n, const QString& path, bool enabled = true) {
-        const QString number = n == 1 ? QString() : QString::number(n);
-        fake.store.SaveSetting("Settings", "ROM" + number + "Path", path);
-        fake.store.SaveSetting("Settings", "ROM" + number + "Checked", enabled ? "True" : "False");
-    }
-    // A folder under the temporary root holding empty files with these names.
-    QString romFolder(const QString& name, const QStringList& files) {
-        const QString folder = fake.makeFolder(name);
+    void set(const QString& key, const QString& to) { fake.store.SaveSetting("Settings", key, to); }
+    // ROM folder entry n (from 1) by its keys' names: a folder with empty files, or "".
+    void storeFolder(int n, const QString& name, const QStringList& files = {},
+                     const QString& checked = "True") {
         for (const QString& file : files)
             fake.writeFile(name + "/" + file);
-        return folder;
+        const QString number = n == 1 ? QString() : QString::number(n);
+        set("ROM" + number + "Path", name.isEmpty() ? name : fake.makeFolder(name));
+        set("ROM" + number + "Checked", checked);
     }
     // Both paths known: the emulator z26 in "emu", the ROMs in "roms".
-    QString storePaths(const QStringList& roms = {"a.bin"}) {
-        fake.writeFile("emu/z26");
-        fake.store.SaveSetting("Settings", "Z26Path", fake.root() + "/emu");
-        storeFolder(1, romFolder("roms", roms));
-        return fake.root() + "/roms";
+    void storePaths(const QStringList& roms = {"a.bin"}) {
+        set("Z26Path", fake.writeFile("emu/z26").chopped(4));
+        storeFolder(1, "roms", roms);
     }
-    // The window as the start-up routine makes it: built (its folders' listing starts),
-    // loaded, shown.
+    // As the start-up routine makes it: built (its listing starts), loaded, shown.
     frmMain& load() {
         if (!window)
             window = std::make_unique<frmMain>(fake.platform);
@@ -51,30 +51,45 @@ protected:
     }
 
     QAction* action(const char* name) const { return control<QAction>(*window, name); }
+    void selectRow(int row) const { list()->setCurrentIndex(window->listModel().index(row, 0)); }
+    QString rows() const {
+        QStringList names;
+        for (int row = 0; row < window->listModel().rowCount(); ++row)
+            names << window->listModel().name(row);
+        return names.join(", ");
+    }
     ListView* list() const { return control<ListView>(*window, "vbalListViewCtl1"); }
     frmSettings& settings() const { return window->settingsWindow(); }
-    QStringList names() const {
-        QStringList out;
-        for (int row = 0; row < window->listModel().rowCount(); ++row)
-            out << window->listModel().name(row);
-        return out;
-    }
-    void selectRow(int row) const { list()->setCurrentIndex(window->listModel().index(row, 0)); }
     // What the next start would read from the store, or "<missing>".
     QString stored(const QString& key, const QString& section = "Settings") const {
         return fake.reopenStore()->GetSetting(section, key, "<missing>");
     }
-    std::vector<std::string> boxes() const { return boxLines(fake.dialogs); }
-    // The balloon tip shown on a control as "icon | title | text", or "none"; reading it
-    // closes it, as the user's click would.
-    static std::string balloon(QWidget* box) {
-        BalloonTip* tip = cTextBoxXP::shownOn(box);
-        if (!tip)
-            return "none";
-        const QString shown =
-            QString::number(tip->icon()) + " | " + tip->title() + " | " + tip->text();
-        tip->close();
-        return shown.toStdString();
+    // Since the last call, one line each, the root written "~": programs started, files and
+    // pages opened, boxes, the other windows showing and balloon tips (closed, as by a click).
+    QString happened() {
+        QStringList seen, windows;
+        for (const FakeShell::Start& start : fake.shell.started)
+            seen << (QStringList{start.program} + start.arguments).join(' ') + start.workingFolder;
+        for (const QString& opened : fake.shell.textFiles + fake.shell.urls)
+            seen << "open " + opened;
+        for (const FakeDialogs::Box& box : fake.dialogs.boxes)
+            seen << QString::fromStdString(boxLine(box));
+        for (QWidget* shown : QApplication::topLevelWidgets()) {
+            if (!shown->isVisible())
+                continue;
+            if (auto* page = qobject_cast<frmSettings*>(shown))
+                windows << "page " + page->selectedPage();
+            if (qobject_cast<frmAbout*>(shown))
+                windows << "about";
+            if (auto* tip = qobject_cast<BalloonTip*>(shown); tip && tip->close())
+                windows << "tip " + tip->parentWidget()->objectName() + ' ' +
+                               QString::number(tip->icon()) + " | " + tip->title() + " | " +
+                               tip->text();
+        }
+        windows.sort(); // about, page, tip: in no particular order otherwise
+        fake.shell = FakeShell();
+        fake.dialogs.boxes.clear();
+        return (seen + windows).join('\n').replace(fake.root(), "~");
     }
 
     FakePlatform fake;
