@@ -29,19 +29,6 @@ TEST(LeadingNumber, SinglesStayFiniteSoEveryTextCanBeSaved) {
     EXPECT_EQ(leadingSingle(u"abc"), 0.0f);
 }
 
-TEST(LeadingNumber, WholeNumberMustBeNothingButANumber) {
-    const struct {
-        const char* text;
-        std::optional<double> value;
-    } cases[] = {
-        {"46", 46},           {" 46 ", 46},          {"12.", 12},           {"0.", 0},
-        {"-1.5", -1.5},       {"1e+", std::nullopt}, {"-", std::nullopt},   {"", std::nullopt},
-        {"4a", std::nullopt}, {"a", std::nullopt},   {"1 2", std::nullopt},
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(wholeDecimalNumber(QString::fromLatin1(c.text)), c.value) << c.text;
-}
-
 TEST(ShortestDecimalText, WritesTheShortestTextThatReadsBack) {
     const struct {
         float value;

@@ -161,14 +161,15 @@ TEST(OptionSet, SoundQueueRangeIsCentredOnTheStoredHundreds) {
         {4608, SliderScale{4500, 4700, 4608}},
         {50, SliderScale{-100, 100, 50}},
         {150, SliderScale{0, 200, 150}},
-        {65536, SliderScale{65400, 65600, 65536}},
         {-5, SliderScale{-100, 100, -5}},
+        {-0.75f, SliderScale{-100, 100, -1}},
+        {5, SliderScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives
         // A fraction: the hundreds do not frame the value (12 lies outside 1100 to 1300).
         {12.5f, std::nullopt},
         {3839.625f, std::nullopt},
-        {0.5f, SliderScale{-100, 100, 0}},
-        {-0.75f, SliderScale{-100, 100, -1}},
-        {5, SliderScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives
+        // Hundreds that are no number ("-", "1e+") or beyond the bar's range.
+        {-50, std::nullopt},
+        {1e20f, std::nullopt},
         {1e12f, std::nullopt},
         {std::numeric_limits<float>::quiet_NaN(), std::nullopt},
     };

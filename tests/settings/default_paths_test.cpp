@@ -206,13 +206,9 @@ TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
 
     auto* choose = control<QPushButton>(*w, "cmdAddZ26Path");
     choose->click(); // cancelled
-    ASSERT_EQ(fake.dialogs.fileRequests.size(), 1u);
-    const FileDialogRequest& r = fake.dialogs.fileRequests[0].request;
-    EXPECT_FALSE(fake.dialogs.fileRequests[0].save);
-    EXPECT_EQ(QStringList({r.title, r.filter, r.initialFolder, QString::number(r.filterIndex),
-                           QString::number(r.flags, 16)}),
-              QStringList({"Choose z26 path", "z26 executable (z26)|z26|All Files (*.*)|*.*",
-                           fake.programFolder(), "1", "1800"}));
+    EXPECT_EQ(requestLines(fake.dialogs),
+              Lines{"open | Choose z26 path | z26 executable (z26)|z26|All Files (*.*)|*.* | " +
+                    fake.programFolder().toStdString() + " | 1 | 1800"});
     EXPECT_EQ(stored("Z26Path"), "<missing>");
 
     fake.dialogs.paths = {emu};

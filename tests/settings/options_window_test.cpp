@@ -149,21 +149,26 @@ TEST_F(OptionControls, WhatTheControlsShowTheyGiveBack) {
 }
 
 TEST_F(OptionControls, ThePortsDecideWhichControlsCanBeUsed) {
+    // Which of the keyboard, mouse, joystick and Stelladaptor boxes, the light gun and the
+    // keyboard paddle can be used.
+    const auto usable = [this] {
+        QString shown;
+        for (const char* name : {"chkIPCKeyboard", "chkIPCMouse", "chkIPCJoystick", "chkIPCStella"})
+            shown += get<QCheckBox>(name)->isEnabled() ? u'+' : u'-';
+        for (const char* frame : {"fraLightgun", "fraPaddleSens"})
+            shown += get<QGroupBox>(frame)->isHidden() ? " off" : " on";
+        return shown;
+    };
     get<QCheckBox>("chkIPCMouse")->click();
     get<QComboBox>("comboLeftController")->setCurrentIndex(3);  // Keypad
     get<QComboBox>("comboRightController")->setCurrentIndex(5); // LightGun
-    QString enabled;
-    for (const char* name : {"chkIPCKeyboard", "chkIPCMouse", "chkIPCJoystick", "chkIPCStella"})
-        enabled += get<QCheckBox>(name)->isEnabled() ? u'+' : u'-';
-    EXPECT_EQ(enabled, "++--");
+    EXPECT_EQ(usable(), "++-- on on");
     EXPECT_EQ(get<QPushButton>("cmdLeftControlPic")->text(), "Keyboard Control Layout");
-    EXPECT_FALSE(get<QGroupBox>("fraLightgun")->isHidden());
-    EXPECT_FALSE(get<QGroupBox>("fraPaddleSens")->isHidden());
     get<QCheckBox>("chkIPCKeyboard")->click();
-    EXPECT_TRUE(get<QGroupBox>("fraPaddleSens")->isHidden());
+    EXPECT_EQ(usable(), "++-- on off");
     EXPECT_EQ(preview(), "-)KP -(LG -iKM -M1 -l0 -a0");
     get<QComboBox>("comboRightController")->setCurrentIndex(0);
-    EXPECT_TRUE(get<QGroupBox>("fraLightgun")->isHidden());
+    EXPECT_EQ(usable(), "++++ off off");
     EXPECT_TRUE(get<QCheckBox>("chkIPCMouse")->isChecked()); // disabled, never cleared
 }
 
@@ -295,17 +300,14 @@ TEST_F(OptionControls, SliderBarsSetTheirOptionByMouseKeysAndMenu) {
     // The sound queue: + and - move its scale, a value left behind lands inside; the
     // menu does the same and resets; the right button only opens the menu.
     auto* queue = get<vbalProgressBar>("BarColorSoundQueue");
-    QTest::keyClick(queue, '+');
-    EXPECT_EQ(bar("BarColorSoundQueue"), "4600..4800 at 4700 '4,700'");
-    QTest::keyClick(queue, '+');
-    QTest::keyClick(queue, '+');
+    for (int i = 0; i < 3; ++i)
+        QTest::keyClick(queue, '+');
     EXPECT_EQ(bar("BarColorSoundQueue"), "4800..5000 at 4805 '4,805'");
     EXPECT_TRUE(previewHas("-s4805"));
     auto* menu = get<QMenu>("mnuSQPopup");
     mouse(queue, QEvent::MouseButtonPress, 3, Qt::RightButton, Qt::RightButton);
     EXPECT_TRUE(menu->isVisible());
     menu->hide();
-    EXPECT_EQ(bar("BarColorSoundQueue"), "4800..5000 at 4805 '4,805'");
     get<QAction>("mnuSQShiftDown")->trigger();
     EXPECT_EQ(bar("BarColorSoundQueue"), "4700..4900 at 4805 '4,805'");
     get<QAction>("mnuSQReset")->trigger();
@@ -338,13 +340,8 @@ TEST(SliderRules, SoundQueueShiftsStayOnTheScale) {
         EXPECT_TRUE(scale == c.expected)
             << c.what << ": " << scale.min << ".." << scale.max << " at " << scale.value;
     }
-    for (const auto& [value, separator, text] :
-         {std::tuple{qint64(999), u",", u"999"},
-          {-4608, u",", u"-4,608"},
-          {std::numeric_limits<qint64>::min(), u",", u"-9,223,372,036,854,775,808"},
-          {1234567, u"\u202F", u"1\u202F234\u202F567"}})
-        EXPECT_EQ(sliders::FormatThousands(value, QString::fromUtf16(separator)),
-                  QString::fromUtf16(text));
+    EXPECT_EQ(sliders::FormatThousands(std::numeric_limits<qint64>::min(), ","),
+              "-9,223,372,036,854,775,808");
     // Always grouped, even where the locale would leave a four-digit number alone.
     EXPECT_EQ(sliders::SoundQueueText(4608, QLocale(QLocale::Spanish, QLocale::Spain)), "4.608");
 }

@@ -5,7 +5,7 @@
 
 #include "emulator/OptionFile.h"
 
-#include <QFile>
+#include <QImageReader>
 #include <QtEndian>
 
 namespace {
@@ -30,16 +30,11 @@ TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     w->cmdLoadDat_Click(); // cancelled
     EXPECT_EQ(status(*w), "before");
     EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "tip");
-    ASSERT_EQ(fake.dialogs.fileRequests.size(), 2u);
-    for (const auto& [bSave, request] : fake.dialogs.fileRequests) {
-        EXPECT_EQ(QStringList({request.title, request.filter, request.initialFolder}),
-                  QStringList({"Choose File to Save Configuration",
-                               "lum configurations (*.lum)|*.lum|All Files (*.*)|*.*",
-                               fake.programFolder()}));
-        EXPECT_EQ(request.filterIndex, 1);
-        EXPECT_EQ(request.flags, bSave ? 0x2u : 0x1800u);
-    }
-    EXPECT_TRUE(fake.dialogs.fileRequests[0].save);
+    const std::string chooser = " | Choose File to Save Configuration | lum configurations "
+                                "(*.lum)|*.lum|All Files (*.*)|*.* | " +
+                                fake.programFolder().toStdString() + " | 1 | ";
+    EXPECT_EQ(requestLines(fake.dialogs),
+              (Lines{"save" + chooser + "2", "open" + chooser + "1800"}));
 
     // The name as chosen in the status line; ".lum" added unless the name ends in it.
     control<QRadioButton>(*w, "optCPPAL")->click();
@@ -117,4 +112,57 @@ TEST_F(OptionSetButtons, SavingNeverLosesAFile) {
     // A name chosen with its extension was asked about by the chooser itself.
     save(*w, older);
     EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
+}
+
+// data/Default.lum is the option set of the settings window as it starts, written by the
+// window's own save. When the start state or the file's layout changes, its test fails;
+// run it once with LUM_UPDATE_DEFAULT_LUM=1 to write the new file, then commit it.
+namespace {
+
+QString dataFolder() {
+    const QByteArray source = qgetenv("LUM_SOURCE_DIR");
+    if (!source.isEmpty())
+        return QString::fromLocal8Bit(source) + "/data";
+    // Run by hand: the tree this file lies in.
+    return QDir::cleanPath(QFileInfo(QStringLiteral(__FILE__)).absolutePath() + "/../../data");
+}
+
+using DefaultLum = SettingsFixture;
+
+} // namespace
+
+TEST_F(DefaultLum, IsTheStartStateOfTheSettingsWindow) {
+    frmSettings w(fake.platform);
+    const QString path = fake.root() + "/start.lum";
+    fake.dialogs.paths.push_back(path);
+    w.cmdSaveDat_Click();
+    const QByteArray produced = fileBytes(path);
+    ASSERT_EQ(produced.size(), 172);
+    const QString committed = dataFolder() + "/Default.lum";
+    if (!qgetenv("LUM_UPDATE_DEFAULT_LUM").isEmpty()) {
+        ASSERT_TRUE(putFile(committed, produced));
+    }
+    EXPECT_EQ(fileBytes(committed).toHex(' '), produced.toHex(' '))
+        << "data/Default.lum is out of date: run this test with LUM_UPDATE_DEFAULT_LUM=1";
+
+    // And it loads back every option as the window starts.
+    EmulatorOptions changed;
+    changed.quiet = Check::On;
+    changed.palette = Palette::Pal;
+    changed.paddleSensitivity = 3;
+    w.setOptions(changed);
+    ASSERT_TRUE(w.LoadSettings(committed));
+    EmulatorOptions start;
+    start.customFrameRate = "0"; // a set keeps numbers, so the empty rate comes back as 0
+    EXPECT_EQ(w.options(), start);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+}
+
+TEST_F(DefaultLum, ControllerPicturesLieBesideItUnderTheNamesTheButtonsUse) {
+    for (const char* caption : {"Standard Control Layout", "Paddle Control Layout",
+                                "Keyboard Control Layout", "Driving Control Layout"}) {
+        QImageReader reader(dataFolder() + frmSettings::GetPicName(caption));
+        EXPECT_TRUE(reader.canRead()) << caption;
+        EXPECT_EQ(reader.format(), "jpeg") << caption;
+    }
 }

@@ -1,6 +1,5 @@
 #include "SettingsFixture.h"
 
-#include "emulator/EmulatorOptions.h"
 #include "ui/PictureBox.h"
 #include "ui/Twips.h"
 
@@ -15,20 +14,6 @@ TEST_F(SettingsWindow, StartsAsTheGoldenDumpShows) {
     fake.store.SaveSetting("Settings", "Z26Path", "/opt/emulators/z26");
     auto w = open();
     expectGolden("frmSettings", dumpWidgetTree(*w));
-}
-
-// Each option the table names has its control on a page, of the kind that shows it.
-TEST_F(SettingsWindow, EveryOptionHasItsControl) {
-    auto w = open();
-    const char* const kinds[] = {"QComboBox", "QCheckBox",       "QRadioButton",
-                                 "QLineEdit", "vbalProgressBar", "vbalProgressBar"};
-    for (const OptionRow& row : optionTable())
-        for (int i = 0; i < row.slotCount; ++i)
-            if (const char* name = row.slotList[std::size_t(i)].control) {
-                const QObject* found = w->findChild<QObject*>(QLatin1String(name));
-                ASSERT_NE(found, nullptr) << name;
-                EXPECT_TRUE(found->inherits(kinds[int(row.kind)])) << name;
-            }
 }
 
 TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {

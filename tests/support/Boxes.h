@@ -24,5 +24,17 @@ inline std::vector<std::string> boxLines(const FakeDialogs& dialogs) {
     return lines;
 }
 
+// Every file chooser asked for so far, one line each: "open|save | title | filter |
+// folder | filter index | flags in hex".
+inline std::vector<std::string> requestLines(const FakeDialogs& dialogs) {
+    std::vector<std::string> lines;
+    for (const auto& [bSave, r] : dialogs.fileRequests)
+        lines.push_back(QStringList({bSave ? "save" : "open", r.title, r.filter, r.initialFolder,
+                                     QString::number(r.filterIndex), QString::number(r.flags, 16)})
+                            .join(" | ")
+                            .toStdString());
+    return lines;
+}
+
 // The expected lines, written as a list of texts.
 using Lines = std::vector<std::string>;
