@@ -3,6 +3,7 @@
 #include "support/LocalHttpServer.h"
 #include "support/Unreadable.h"
 #include "support/WidgetDump.h"
+#include "support/Widgets.h"
 
 #include "about/AboutArt.h"
 #include "about/SysInfo.h"
@@ -10,12 +11,7 @@
 #include "about/frmAbout.h"
 #include "ui/Twips.h"
 
-#include <QBuffer>
-#include <QLabel>
 #include <QPointer>
-#include <QPushButton>
-#include <QSignalSpy>
-#include <QTest>
 #include <QTimer>
 
 #include <gtest/gtest.h>
@@ -40,20 +36,15 @@ std::string read(QByteArray content, bool forumOnly = false) {
     return statuses[static_cast<int>(s.status)] + (" | " + fields.join(" | ")).toStdString();
 }
 
-TEST(UpdateDescription, VersionNumbers) {
+TEST(UpdateDescription, VersionsHeadersAndInstallerNames) {
     EXPECT_EQ(parseVersionNumber(QStringLiteral(" 1049613\t")), 1049613);
     for (const char* bad :
          {"", "1.1.13", "+5", "-5", "12abc", "1 2", "99999999999999999999999", "\u0661\u0662"})
         EXPECT_FALSE(parseVersionNumber(QString::fromUtf8(bad))) << bad;
-}
-
-TEST(UpdateDescription, HeadersAndInstallerNames) {
     EXPECT_TRUE(isSectionHeader("::" + kProduct, kProduct));
     for (const QString& other : {"::" + kProduct.toUpper(), "::" + kProduct + " ", ":: " + kProduct,
                                  "x::" + kProduct, kProduct})
         EXPECT_FALSE(isSectionHeader(other, kProduct)) << other.toStdString();
-    // Short lines never qualify, not even for an empty name.
-    EXPECT_FALSE(isSectionHeader(QStringLiteral("::"), QString()));
 
     for (const char* good : {"setup.exe", "lum-1.1.13.run", "a b.bin"})
         EXPECT_TRUE(isSafeInstallerFileName(QString::fromUtf8(good))) << good;
@@ -65,42 +56,31 @@ TEST(UpdateDescription, HeadersAndInstallerNames) {
 // The forum line alone in forum mode, every line otherwise; CR LF or LF; after 8 MiB of
 // other sections.
 TEST(UpdateDescription, FindsTheSection) {
-    const QByteArray file = "::Other Program\r\nhttps://other\r\n2098176\r\n" + kHeader +
-                            "https://example.org/forum/lum\r\n1049613\r\nMay 1st\r\n"
-                            "https://example.org/setup.exe\r\nsetup.exe\r\n1\r\nafter the flag\r\n";
-    const QByteArray others =
-        QByteArray("::Some other product\r\nhttps://example.org/other\r\n'a message\r\n")
-            .repeated(120000);
+    const QByteArray full = kHeader + "forum\r\n'note\r\n1049613\r\ndate\r\nurl\r\nname\r\n1\r\n";
+    const QByteArray file = "::Other\r\nhttps://other\r\n2098176\r\n" + full + "after the flag\r\n";
+    const QByteArray others = QByteArray("::Other\r\nforum\r\n'a message\r\n").repeated(300000);
+    const std::string complete = "Complete | forum | \nnote\n | 1049613 | date | url | name | 1";
     const std::tuple<QByteArray, bool, std::string> rows[] = {
-        {file, false,
-         "Complete | https://example.org/forum/lum |  | 1049613 | May 1st | "
-         "https://example.org/setup.exe | setup.exe | 1"},
-        {file, true, "Complete | https://example.org/forum/lum |  | 0 |  |  |  | "},
-        {others + "::lum (Windows Front End for z26)\nf\n'Hello\n'World\n1049613\nd\nu\nn\n0\n",
-         false, "Complete | f | \nHello\nWorld\n | 1049613 | d | u | n | 0"},
-        {kHeader + "f\r\n'note\r\n1.1.13\r\nd\r\n", false,
-         "BadVersion | f | \nnote\n | 0 |  |  |  | "},
+        {file, false, complete},
+        {file, true, "Complete | forum |  | 0 |  |  |  | "},
+        {others + QByteArray(full).replace("\r\n", "\n"), false, complete},
+        {kHeader + "f\r\n'n\r\n1.1.13\r\nd\r\n", false, "BadVersion | f | \nn\n | 0 |  |  |  | "},
         {kHeader, true, "Truncated |  |  | 0 |  |  |  | "},
     };
     for (const auto& [content, forumOnly, section] : rows)
         EXPECT_EQ(read(content, forumOnly), section) << content.left(80).toStdString();
     // No section for this product: nothing, binary noise, one line of 8 MiB, a NUL after the
     // name, other sections only.
-    const QByteArray none[] = {{},
-                               QByteArray("\0\xff\r::\x80\r\n\x01:\n", 11),
-                               QByteArray(8 * 1024 * 1024, 'x'),
-                               QByteArray("::lum (Windows Front End for z26)\0\r\n", 36),
+    const QByteArray none[] = {QByteArray(), QByteArray("\0\xff\r::\x80\r\n\x01:\n", 11),
+                               QByteArray(8 * 1024 * 1024, 'x'), kHeader.chopped(2) + '\0' + "\r\n",
                                file.left(file.indexOf("::lum"))};
     for (const QByteArray& content : none)
         for (const bool forumOnly : {false, true})
             EXPECT_EQ(read(content, forumOnly), "NotFound |  |  | 0 |  |  |  | ")
                 << content.left(80).toStdString();
-
-    // Cut after any line of the section, it is incomplete.
-    const QByteArray full = kHeader + "f\r\n'note\r\n1049613\r\ndate\r\nurl\r\nname\r\n0\r\n";
-    for (qsizetype end = full.indexOf("\r\n"); end + 2 < full.size();
-         end = full.indexOf("\r\n", end + 2))
-        EXPECT_EQ(read(full.left(end + 2)).substr(0, 9), "Truncated") << end;
+    // Cut after any line before the run flag's end, it is incomplete.
+    for (qsizetype end = 0; (end = full.indexOf('\n', end) + 1) < full.size();)
+        EXPECT_EQ(read(full.left(end)).substr(0, 9), "Truncated") << end;
 }
 
 class About : public ::testing::Test {
@@ -123,8 +103,7 @@ protected:
         for (const QString& folder : fake.shell.folders)
             out += "show " + folder.toStdString() + '\n';
         for (const FakeShell::Start& s : fake.shell.started)
-            out +=
-                "start " + (QStringList{s.program} + s.arguments).join(u' ').toStdString() + '\n';
+            out += "start " + (QStringList{s.program} + s.arguments).join(' ').toStdString() + '\n';
         if (!ends.isEmpty())
             out += "end program\n";
         ends.clear();
@@ -132,11 +111,9 @@ protected:
         fake.shell = FakeShell(); // forgets, and works again
         return out;
     }
-    // Clicks Forum or Update with `description` on the server (an empty one is not found).
-    // A box that is not scripted answers with its first button.
-    std::string check(bool forum, const QByteArray& description, MsgResult answer) {
-        server.responses["/programs/update.txt"] = {
-            description.isEmpty() ? 404 : 200, description, {}, false, -1};
+    // Clicks Forum or Update with `file` on the server (an empty one is not found).
+    std::string check(bool forum, const QByteArray& file, MsgResult answer = MsgResult::Yes) {
+        server.responses["/programs/update.txt"] = {file.isEmpty() ? 404 : 200, file, {}, false};
         fake.dialogs.answers = {answer};
         QTest::mouseClick(forum ? window->cmdForum : window->cmdUpdate, Qt::LeftButton);
         return happened();
@@ -175,8 +152,10 @@ TEST_F(About, SystemInformation) {
 }
 
 // The texts and colours; the product name as large as fits its place; background tiles
-// all over: the top strip and the left edge show tiles only, the last ones cut.
-TEST_F(About, GoldenTextsColoursAndATiledBackground) {
+// all over: the top strip and the left edge show tiles only, the last ones cut. The address
+// lights up under the mouse until it moves onto the window's own surface; the links open
+// their pages; OK closes the window as the close box does, which deletes it.
+TEST_F(About, LooksHoverLinksAndOk) {
     QString dump = dumpWidgetTree(*window);
     for (const QLabel* label : window->findChildren<QLabel*>())
         if (!label->text().isEmpty())
@@ -196,12 +175,7 @@ TEST_F(About, GoldenTextsColoursAndATiledBackground) {
         ASSERT_EQ(shot.pixel(x, 3), tile.pixel(x % tile.width(), 3)) << x;
     for (int y = 0; y < shot.height(); ++y)
         ASSERT_EQ(shot.pixel(3, y), tile.pixel(3, y % tile.height())) << y;
-}
 
-// The address lights up under the mouse until it moves onto the window's own surface; the
-// links open their pages; OK closes the window as the close box does, which deletes it.
-TEST_F(About, EmailHoverLinksAndOk) {
-    window->show(); // lays the controls out
     const auto moveTo = [this](QWidget* widget, QPoint position) {
         QTest::mouseMove(widget, position);
         return window->lblEmail->palette().color(QPalette::WindowText).name();
@@ -210,8 +184,7 @@ TEST_F(About, EmailHoverLinksAndOk) {
     EXPECT_EQ(moveTo(window, window->cmdOK->geometry().center()), "#4e88ff");
     EXPECT_EQ(moveTo(window, QPoint(2, 2)), "#00ffff");
 
-    for (QWidget* link :
-         std::initializer_list<QWidget*>{window->lblEmail, window->cmdWeb, window->cmdDonate})
+    for (QWidget* link : QWidgetList{window->lblEmail, window->cmdWeb, window->cmdDonate})
         QTest::mouseClick(link, Qt::LeftButton);
     EXPECT_EQ(happened(), "open mailto:support@lum.example.org?Subject=" + kProduct.toStdString() +
                               " v1.1.12 Question\nopen https://lum.example.org/\n"
@@ -225,28 +198,27 @@ TEST_F(About, EmailHoverLinksAndOk) {
 // Everything short of a download: nothing is fetched and nothing made but the local copy.
 // After a forum lookup, whatever its outcome, Update checks for updates.
 TEST_F(About, WhatEachDescriptionLeadsTo) {
+    using enum MsgResult;
     const std::string forum = "open " + server.base().toStdString() + "/forum\n";
     const std::tuple<bool, QByteArray, MsgResult, std::string> rows[] = {
-        {true, QByteArray(), MsgResult::Ok,
-         kFailedCheck + "Failed to connect to the internet | Ok | Information\n"},
-        {false, section("1049612", "'Hello\r\n'World\r\n"), MsgResult::Ok,
+        {true, {}, Ok, kFailedCheck + "Failed to connect to the internet | Ok | Information\n"},
+        {false, section("1049612", "'Hello\r\n'World\r\n"), Ok,
          "Update Message | \nHello\nWorld\n | Ok | Information\nNo update needed | You have the "
          "current version 1.1.12 Released June 2nd\nNo update is needed | Ok | None\n"},
-        {true, section("1049612"), MsgResult::Ok, "open https://example.org/forum/lum\n"},
-        {true, kHeader + "file:///etc/passwd\r\n", MsgResult::Ok, forum}, // web pages only
-        {true, "::Other\r\n", MsgResult::Ok, forum},
-        {false, "::Other\r\n", MsgResult::Ok,
-         "No updates available | No Updates Found | Ok | None\n"},
-        {false, section("1049611"), MsgResult::Ok,
+        {true, section("1049612"), Ok, "open https://example.org/forum/lum\n"},
+        {true, kHeader + "file:///etc/passwd\r\n", Ok, forum}, // web pages only
+        {true, "::Other\r\n", Ok, forum},
+        {false, "::Other\r\n", Ok, "No updates available | No Updates Found | Ok | None\n"},
+        {false, section("1049611"), Ok,
          "No update needed | Huh, that's odd... \nThis Version is newer that what's available\n"
          "on the internet. | Ok | None\n"},
-        {false, section("1049613"), MsgResult::No, kAsk},
-        {false, section("1049613"), MsgResult::Cancel, kAsk},
-        {false, kHeader + "f\r\n", MsgResult::Ok,
+        {false, section("1049613"), No, kAsk},
+        {false, section("1049613"), Cancel, kAsk},
+        {false, kHeader + "f\r\n", Ok,
          kFailedCheck + "The update information is incomplete. | Ok | Information\n"},
-        {false, kHeader + "f\r\n1.1.13\r\n", MsgResult::Ok,
+        {false, kHeader + "f\r\n1.1.13\r\n", Ok,
          kFailedCheck + "The update information holds no valid version. | Ok | Information\n"},
-        {false, section("1049613", {}, "../setup.run"), MsgResult::Yes,
+        {false, section("1049613", {}, "../setup.run"), Yes,
          kFailedCheck + "The update names an installer file that cannot be accepted: "
                         "\"../setup.run\" | Ok | Information\n"},
     };
@@ -289,12 +261,10 @@ TEST_F(About, Downloads) {
             fake.writeFile("program/Update/setup.run", before);
         server.responses["/files/setup.run"] = {body ? 200 : 404, body, {}, false, -1};
         fake.shell.succeed = limit != WontStart;
-        QFile::setPermissions(program,
-                              limit == ReadOnly ? QFile::ReadOwner | QFile::ExeOwner : writable);
+        QFile::setPermissions(program, limit == ReadOnly ? writable ^ QFile::WriteOwner : writable);
         const NoPermissionOverride asAnyone;
         ASSERT_TRUE(asAnyone.holds());
-        std::string seen =
-            check(false, section("1049613", {}, "setup.run", runFlag), MsgResult::Yes);
+        std::string seen = check(false, section("1049613", {}, "setup.run", runFlag));
         seen += folderEntries(update).join(u' ').toStdString() + ' ';
         EXPECT_EQ(seen + fileBytes(update + "/setup.run").toStdString(), did);
         EXPECT_TRUE(runFlag == "0" || QFileInfo(update + "/setup.run").isExecutable());

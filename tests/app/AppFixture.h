@@ -1,7 +1,9 @@
 #pragma once
 
 #include "support/Boxes.h"
+#include "support/Files.h"
 #include "support/WidgetDump.h"
+#include "support/Widgets.h"
 
 #include "about/frmAbout.h"
 #include "app/frmMain.h"
@@ -11,20 +13,10 @@
 #include "ui/cTextBoxXP.h"
 #include "ui/vbalProgressBar.h"
 
-#include <QAction>
-#include <QApplication>
-#include <QFile>
-#include <QGroupBox>
-#include <QLabel>
-#include <QLineEdit>
-#include <QTest>
-
 #include <gtest/gtest.h>
 
-#include <memory>
-
 // A main window over a fake platform; helpers lay out the store and tell what happened.
-class AppFixture : public ::testing::Test {
+class MainWindow : public ::testing::Test {
 protected:
     void set(const QString& key, const QString& to) { fake.store.SaveSetting("Settings", key, to); }
     // ROM folder entry n (from 1) by its keys' names: a folder with empty files, or "".
@@ -51,12 +43,12 @@ protected:
     }
 
     QAction* action(const char* name) const { return control<QAction>(*window, name); }
-    void selectRow(int row) const { list()->setCurrentIndex(window->listModel().index(row, 0)); }
-    QString rows() const {
+    // The window's title and the rows' names.
+    QString listing() const {
         QStringList names;
         for (int row = 0; row < window->listModel().rowCount(); ++row)
             names << window->listModel().name(row);
-        return names.join(", ");
+        return window->windowTitle() + " | " + names.join(", ");
     }
     ListView* list() const { return control<ListView>(*window, "vbalListViewCtl1"); }
     frmSettings& settings() const { return window->settingsWindow(); }
@@ -75,13 +67,12 @@ protected:
         for (const FakeDialogs::Box& box : fake.dialogs.boxes)
             seen << QString::fromStdString(boxLine(box));
         for (QWidget* shown : QApplication::topLevelWidgets()) {
-            if (!shown->isVisible())
-                continue;
-            if (auto* page = qobject_cast<frmSettings*>(shown))
+            if (auto* page = qobject_cast<frmSettings*>(shown); page && page->isVisible())
                 windows << "page " + page->selectedPage();
-            if (qobject_cast<frmAbout*>(shown))
+            if (qobject_cast<frmAbout*>(shown) && shown->isVisible())
                 windows << "about";
-            if (auto* tip = qobject_cast<BalloonTip*>(shown); tip && tip->close())
+            if (auto* tip = qobject_cast<BalloonTip*>(shown);
+                tip && tip->isVisible() && tip->close())
                 windows << "tip " + tip->parentWidget()->objectName() + ' ' +
                                QString::number(tip->icon()) + " | " + tip->title() + " | " +
                                tip->text();

@@ -2,23 +2,17 @@
 
 #include "platform/QtShell.h"
 
-#include <QCheckBox>
-
-using Launch = AppFixture;
-
 // A path leading nowhere is said; no program there, no selection, a failed start are not.
-TEST_F(Launch, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
+TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     const QString name = "River Raid (it's \"good\") $HOME.bin"; // one argument, as it is
     storePaths({name, "Space Invaders.bin"});
-    fake.writeFile("emu/Z26");
     fake.makeFolder("named/z26");
     load();
     window->LoadROM(); // nothing selected yet
     EXPECT_EQ(happened(), "");
-    selectRow(1);
+    list()->setCurrentIndex(window->listModel().index(1, 0));
     const QString run = "~/emu/z26 ~/roms/Space Invaders.bin";
     const std::pair<const char*, QString> paths[] = {
-        {"/emu/Z26", "~/emu/Z26 ~/roms/Space Invaders.bin -p8 -M1"}, // no z26 added
         {"", "Invalid z26 Path | z26 path isn't valid.\n\nTry removing the z26 path and "
              "re-adding it to correct the problem. | Ok | Exclamation"},
         {"/named", ""}, // a folder whose z26 is a folder
@@ -35,8 +29,6 @@ TEST_F(Launch, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     EmulatorOptions o;
     o.leftController = o.rightController = 12;
     o.lowerSensitivity = Check::On;
-    o.lowerSensitivityBy = "0";
-    settings().setOptions(o);
     const QString question = "There Are No Active Controllers | It's going to be difficult "
                              "playing the game\nwith all the available Controllers inactive\n\n"
                              "Do you still want to load the ROM? | YesNoCancel | Information";
@@ -44,24 +36,23 @@ TEST_F(Launch, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
         question + "\npage Controls\ntip txtIPC4Balloon 1 | There Are No Active Controllers | "
                    "Allowing at least one controller to be\r\nactive will make gameplay much "
                    "easier.";
-    const std::pair<MsgResult, QString> answers[] = {
-        {MsgResult::No, noControllers},
-        {MsgResult::Cancel, noControllers},
-        {MsgResult::Yes,
+    using enum MsgResult;
+    const std::tuple<MsgResult, const char*, QString> answers[] = {
+        {No, "0", noControllers},
+        {Cancel, "0", noControllers},
+        {Yes, "0",
          question + "\npage PaddlesAudio\ntip txtLowerSens 3 | Zero Value | Number Cannot Be Zero"},
+        {Yes, "2", run + " -)NC -(NC -P2 -M1\n" + question},
     };
-    for (const auto& [answer, outcome] : answers) {
+    for (const auto& [answer, sensitivity, outcome] : answers) {
+        o.lowerSensitivityBy = sensitivity;
+        settings().setOptions(o);
         settings().hide();
         settings().selectPage("Settings");
         fake.dialogs.answers = {answer};
         window->LoadROM();
-        EXPECT_EQ(happened(), outcome);
+        EXPECT_EQ(happened(), outcome) << sensitivity;
     }
-    o.lowerSensitivityBy = "2";
-    settings().setOptions(o);
-    settings().hide();
-    window->LoadROM(); // answered Yes
-    EXPECT_EQ(happened(), run + " -)NC -(NC -P2 -M1\n" + question);
 
     // "Edit Switches": Enter starts with the text as edited, the paths checked again.
     control<QCheckBox>(settings(), "chkDOSSwitch")->click();
@@ -79,22 +70,16 @@ TEST_F(Launch, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
               "and re-adding them to correct the problem. | Ok | Exclamation\npage Debug");
 
     // The whole way, by a real shell; written aside first, never read half written.
-    const QString script = fake.writeFile(
+    const QString z26 = fake.writeFile(
         "emu/z26", "#!/bin/sh\nprintf '%s\\n' \"$@\" > \"$0.tmp\" && mv \"$0.tmp\" \"$0.txt\"\n");
-    ASSERT_TRUE(QFile::setPermissions(script, QFile::permissions(script) | QFile::ExeOwner));
-    QtShell shell;
-    Platform platform{fake.store,           fake.dialogs, shell,
-                      fake.programFolder(), fake.network, fake.registry};
-    frmMain w(platform);
-    w.Form_Load();
-    w.show();
-    auto* view = control<ListView>(w, "vbalListViewCtl1");
-    const QPoint at = view->visualRect(w.listModel().index(0, 0)).center();
-    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, at);
-    QTest::mouseDClick(view->viewport(), Qt::LeftButton, {}, at);
-    QFile record(script + ".txt");
-    for (int waited = 0; waited < 10000 && !record.exists(); waited += 50)
-        QTest::qWait(50);
-    ASSERT_TRUE(record.open(QIODevice::ReadOnly)) << "the stand-in emulator never ran";
-    EXPECT_EQ(QString::fromUtf8(record.readAll()), fake.root() + "/roms/" + name + "\n-p8\n-M1\n");
+    ASSERT_TRUE(QFile::setPermissions(z26, QFile::permissions(z26) | QFile::ExeOwner));
+    QtShell os;
+    Platform real{fake.store, fake.dialogs, os, fake.programFolder(), fake.network, fake.registry};
+    window = std::make_unique<frmMain>(real);
+    const QPoint at = list()->visualRect(load().listModel().index(0, 0)).center();
+    QTest::mouseClick(list()->viewport(), Qt::LeftButton, {}, at);
+    QTest::mouseDClick(list()->viewport(), Qt::LeftButton, {}, at);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return QFile::exists(z26 + ".txt"); }, 10000)); // it ran
+    EXPECT_EQ(fileBytes(z26 + ".txt"), (fake.root() + "/roms/" + name + "\n-p8\n-M1\n").toUtf8());
+    window.reset(); // before the shell and platform it uses, even when a check failed
 }

@@ -2,7 +2,6 @@
 
 #include "library/GameDatabase.h"
 
-#include <QMenu>
 #include <QRegularExpression>
 
 #include <functional>
@@ -19,13 +18,11 @@ struct OnShow : QObject {
     }
 };
 
-using Refresh = AppFixture;
-
 } // namespace
 
 // The enabled folders up to an empty path, also those stored after the listing started,
 // each row with its own folder: Game Info finds the game in the third.
-TEST_F(Refresh, FoldersPatternSearchCaptionsAndThePopupMenu) {
+TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
     storePaths({"Asteroids.bin", "Asteroids [PAL].bin", "Pac-Man.bin", "Pacific.a26"});
     const GameRecord known{.SoftwareID = 57, .Title = {}, .CRC = qint32(0xCBF43926u)};
     fake.writeFile("program/CRCID.dat", encodeGameDatabase({known}));
@@ -48,7 +45,7 @@ TEST_F(Refresh, FoldersPatternSearchCaptionsAndThePopupMenu) {
     bar->installEventFilter(&watch);
     search->setText("  "); // blanks alone are no search
     load();
-    seen << window->windowTitle() + " | " + rows();
+    seen << listing();
 
     const auto rightClick = [this](int row) { // what the popup menu offers
         const QRect r = list()->visualRect(window->listModel().index(row, 0));
@@ -63,15 +60,13 @@ TEST_F(Refresh, FoldersPatternSearchCaptionsAndThePopupMenu) {
     EXPECT_STREQ(rightClick(2), "Refresh");
     EXPECT_STREQ(rightClick(3), "Game Info"); // and Refresh
     action("mnuMainGameInfo")->trigger();
-    EXPECT_TRUE(QRegularExpression("^open https://[^\\n]*/software_page\\.html\\?SoftwareID=57$")
-                    .match(happened())
-                    .hasMatch());
+    EXPECT_TRUE(happened().contains(
+        QRegularExpression("^open https://\\S+/software_page\\.html\\?SoftwareID=57$")));
 
     search->setText("asteroids AND NOT [pal]");
     QTest::keyClick(search, Qt::Key_Return);
-    seen << window->windowTitle() + " | " + rows() + " | " + caption() + ' ' +
-                QString::number(bar->Value()) + '/' + QString::number(bar->Max()) + ' ' +
-                bar->Text();
+    seen << listing() + " | " + caption() + ' ' + QString::number(bar->Value()) + '/' +
+                QString::number(bar->Max()) + ' ' + bar->Text();
     bar->removeEventFilter(&watch);
     EXPECT_EQ(seen.join('\n'),
               "Loading ROM's List... instead\nlum - 4 ROM's Found | Asteroids [PAL].bin, "
@@ -82,8 +77,7 @@ TEST_F(Refresh, FoldersPatternSearchCaptionsAndThePopupMenu) {
     set("ROMFilter", "*.BIN;*.A26");
     search->setText("pac");
     QTest::keyClick(list(), Qt::Key_F5);
-    EXPECT_EQ(rows() + " | " + window->windowTitle(),
-              "Pac-Man.bin, Pacific.a26 | lum - 2 Matches out of 5");
+    EXPECT_EQ(listing(), "lum - 2 Matches out of 5 | Pac-Man.bin, Pacific.a26");
 
     search->setText("pacman");
     const std::tuple<Qt::Key, int, const char*> keys[] = {{Qt::Key_A, 3, "pac AND |man"},
@@ -92,9 +86,7 @@ TEST_F(Refresh, FoldersPatternSearchCaptionsAndThePopupMenu) {
     for (const auto& [key, caret, after] : keys) { // "|" marks the caret
         search->setCursorPosition(caret);
         QTest::keyClick(search, key, Qt::ControlModifier);
-        EXPECT_EQ(search->text().insert(search->cursorPosition(), '|') +
-                      search->selectedText(), // none: Ctrl+A selects nothing here
-                  after);
+        EXPECT_EQ(search->text().insert(search->cursorPosition(), '|'), after);
     }
     QTest::mouseDClick(search, Qt::LeftButton);
     EXPECT_EQ(happened(),
