@@ -1,15 +1,10 @@
 #include "library/CCRC32.h"
 
 #include "support/Boxes.h"
-#include "support/FakePlatform.h"
 #include "support/Unreadable.h"
-
-#include <QFileInfo>
 
 #include <numeric>
 #include <random>
-#include <tuple>
-#include <vector>
 
 #include <sys/stat.h>
 
@@ -17,22 +12,20 @@
 
 namespace {
 
-// The CRC-32 bit by bit, straight from its definition, as the yardstick.
+// The CRC-32 bit by bit, as the yardstick: each bit of a byte, lowest first, meets the running
+// value's lowest bit, which decides whether the polynomial goes in.
 quint32 referenceCrc(QByteArrayView bytes) {
-    quint32 crc = 0xFFFFFFFFu;
-    for (const char byte : bytes) {
-        crc ^= static_cast<unsigned char>(byte);
+    quint32 crc = ~0u;
+    for (const char byte : bytes)
         for (int bit = 0; bit < 8; ++bit)
-            crc = (crc & 1u) ? (crc >> 1) ^ 0xEDB88320u : crc >> 1;
-    }
-    return crc ^ 0xFFFFFFFFu;
+            crc = ((crc ^ (quint8(byte) >> bit)) & 1u) ? (crc >> 1) ^ 0xEDB88320u : crc >> 1;
+    return ~crc;
 }
 
 QByteArray randomBytes(qsizetype size) {
     static std::mt19937 rng(1);
     QByteArray bytes(size, Qt::Uninitialized);
-    for (char& b : bytes)
-        b = static_cast<char>(rng() & 0xFFu);
+    std::generate(bytes.begin(), bytes.end(), [] { return char(rng()); });
     return bytes;
 }
 
@@ -50,18 +43,15 @@ TEST(Crc32, EveryFileGivesTheCrcOfItsBytesOrZeroAndOneBox) {
                     chunks, nullptr};
     };
     const QString readOnly = fake.writeFile("read-only.bin", "123456789");
-    ASSERT_TRUE(QFile::setPermissions(readOnly, QFile::ReadOwner));
-    const QString locked = fake.writeFile("locked.bin", "123456789");
-    ASSERT_TRUE(QFile::setPermissions(locked, {}));
-    const QString fifo = fake.root() + "/pipe";
-    ASSERT_EQ(::mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
-    const QString missing = fake.root() + "/no such.bin";
+    const QString locked = fake.writeFile("locked.bin"), fifo = fake.root() + "/pipe";
+    ASSERT_TRUE(QFile::setPermissions(readOnly, QFile::ReadOwner) &&
+                QFile::setPermissions(locked, {}) && ::mkfifo(QFile::encodeName(fifo), 0600) == 0);
     const Case cases[] = {randomFile({}),
                           randomFile({32768}),
                           randomFile({32767, 2}),
                           randomFile({32767, 32767, 2}),
                           {readOnly, 0xCBF43926u, {9}, nullptr}, // the check value
-                          {missing, 0, {}, "Error: 53. File not found"},
+                          {fake.root() + "/no such.bin", 0, {}, "Error: 53. File not found"},
                           {QString(), 0, {}, "Error: 53. File not found"},
                           {fake.makeFolder("dir"), 0, {}, "Error: 75. Path/File access error"},
                           {fifo, 0, {}, "Error: 75. Path/File access error"},
@@ -76,35 +66,28 @@ TEST(Crc32, EveryFileGivesTheCrcOfItsBytesOrZeroAndOneBox) {
             expected.push_back(float(double(done += chunk) / size));
         const Lines box =
             error ? Lines{"GetCRCFromFile | " + std::string(error) + " | Ok | None"} : Lines{};
-        for (int call = 0; call < 2; ++call) {
-            fake.dialogs.boxes.clear();
-            progress.clear();
-            crc.setInputFileName(path);
-            const qint32 got = crc.GetCRCFromFile();
-            EXPECT_EQ(std::tuple(got, progress, boxLines(fake.dialogs)),
+        crc.setInputFileName(path);
+        // A braced list is evaluated in order: the progress and boxes are those of this call.
+        for (int call = 0; call < 2; ++call, fake.dialogs.boxes.clear())
+            EXPECT_EQ((std::tuple{crc.GetCRCFromFile(), std::exchange(progress, {}),
+                                  boxLines(fake.dialogs)}),
                       std::tuple(qint32(value), expected, box));
-        }
     }
-    EXPECT_FALSE(QFileInfo::exists(missing));
+    EXPECT_FALSE(QFile::exists(fake.root() + "/no such.bin"));
 }
 
 // Every kernel at any alignment gives the bit-by-bit CRC (the files above carry running values).
 TEST(Crc32Kernels, AgreeWithTheReferenceForEveryLengthAndAlignment) {
     const QByteArray data = randomBytes(4096 + 64);
     const auto* bytes = reinterpret_cast<const unsigned char*>(data.constData());
-    std::vector<std::uint32_t (*)(std::uint32_t, const unsigned char*, std::size_t)> kernels = {
-        crc32kernels::updatePortable, crc32kernels::update};
-    if (crc32kernels::clmulAvailable())
-        kernels.push_back(crc32kernels::updateClmul);
-    for (std::size_t length = 0; length <= 4096; length += (length < 300 ? 1 : 97)) {
-        for (const qsizetype offset : {0, 1, 3, 8, 15}) {
-            const quint32 expected = referenceCrc(data.sliced(offset, qsizetype(length)));
-            for (auto kernel : kernels)
-                ASSERT_EQ(kernel(crc32kernels::kInitial, bytes + offset, length) ^ 0xFFFFFFFFu,
-                          expected)
+    using namespace crc32kernels;
+    const auto clmul = clmulAvailable() ? updateClmul : update; // only callable where available
+    for (std::size_t length = 0; length <= 4096; length += (length < 300 ? 1 : 97))
+        for (const qsizetype offset : {0, 1, 3, 8, 15})
+            for (const auto kernel : {updatePortable, update, clmul})
+                ASSERT_EQ(~kernel(kInitial, bytes + offset, length),
+                          referenceCrc(data.sliced(offset, qsizetype(length))))
                     << "length " << length << " offset " << offset;
-        }
-    }
 }
 
 } // namespace

@@ -6,8 +6,6 @@
 
 #include <QFileInfo>
 
-#include <tuple>
-
 #include <sys/stat.h>
 
 #include <gtest/gtest.h>
@@ -17,18 +15,13 @@ namespace {
 // The CRC looked up; its top bit is set, so it must match as the negative number it is.
 constexpr qint32 kKey = static_cast<qint32>(0xCBF43926u);
 
-QByteArray record(qint16 id, qint32 crc) {
-    return GameRecord{id, QStringLiteral("A game"), crc}.encode();
-}
-
 // CRCID.dat in every shape (named by its file): the first whole match wins, read 1,024 records
 // at a time; the file is not created or changed, and what cannot be read identifies nothing.
 TEST(GameDatabase, EveryShapeGivesTheFirstWholeMatchAndTheFileIsLeftAsItWas) {
     FakePlatform fake;
-    const QString fifo = fake.root() + "/a FIFO";
-    ASSERT_EQ(::mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
-    const QString loop = fake.root() + "/a link to itself";
-    ASSERT_TRUE(QFile::link(loop, loop));
+    const auto record = [](qint16 id, qint32 crc) { return GameRecord{id, "A", crc}.encode(); };
+    const QString fifo = fake.root() + "/a FIFO", loop = fake.root() + "/a link to itself";
+    ASSERT_TRUE(::mkfifo(QFile::encodeName(fifo), 0600) == 0 && QFile::link(loop, loop));
     std::vector<std::pair<QString, qint16>> cases = {
         {fake.root() + "/missing", 0},
         {fake.writeFile("empty"), 0},
@@ -53,12 +46,10 @@ TEST(GameDatabase, EveryShapeGivesTheFirstWholeMatchAndTheFileIsLeftAsItWas) {
         cases.push_back({fake.writeFile(name + ", the last cut short", whole.chopped(1)), 0});
     }
     for (const auto& [path, id] : cases) {
-        const auto state = [&path] {
-            return std::pair(QFileInfo::exists(path), QFileInfo(path).size());
-        };
-        const auto before = state();
+        const auto state = [&p = path] { return QFile::exists(p) ? QFileInfo(p).size() : -1; };
+        const qint64 before = state();
         const qint16 found = findSoftwareID(path, kKey);
-        EXPECT_EQ(std::tuple(found, state()), std::tuple(id, before)) << path.toStdString();
+        EXPECT_EQ(std::pair(found, state()), std::pair(id, before)) << path.toStdString();
     }
 }
 
@@ -89,14 +80,12 @@ TEST(GameList, ReadsEntriesAndNamesABadLine) {
         {"UTF-8", {"2, Bad \xFF UTF-8, 1234"}},
         {"already listed on line 2", {"2, Same CRC, 0x00000001"}},
     };
-    for (const auto& [complaint, lines] : cases) {
+    for (const auto& [complaint, lines] : cases)
         for (const QByteArray& line : lines) {
             const auto bad = parseGameList("# header\n1, Good, 1\n" + line + "\n4, Later, 4444\n");
             EXPECT_TRUE(bad.error && bad.error->line == 3 && bad.error->message.contains(complaint))
-                << line.toStdString() << ": "
-                << (bad.error ? bad.error->message.toStdString() : "");
+                << line.constData() << (bad.error ? ": " + bad.error->message.toStdString() : "");
         }
-    }
 }
 
 #if defined(LUM_CRCID_DAT) && defined(LUM_CRCID_SOURCE_DIR)
@@ -105,11 +94,11 @@ TEST(GameList, ReadsEntriesAndNamesABadLine) {
 TEST(GameDatabase, TheBuiltDatabaseIdentifiesTheTestCartridges) {
     FakePlatform fake;
     CCRC32 crc(fake.dialogs);
-    const char* const roms[] = {"rising-bars", "falling-bars", "flashing-screen"};
-    for (int i = 0; i < 3; ++i)
-        EXPECT_EQ(LookupSoftwareID(crc, LUM_CRCID_DAT,
-                                   LUM_CRCID_SOURCE_DIR "/testroms/" + QString(roms[i]) + ".a26"),
-                  32001 + i);
+    qint16 id = 32001;
+    for (const QString rom : {"rising-bars", "falling-bars", "flashing-screen"})
+        EXPECT_EQ(
+            LookupSoftwareID(crc, LUM_CRCID_DAT, LUM_CRCID_SOURCE_DIR "/testroms/" + rom + ".a26"),
+            id++);
     EXPECT_TRUE(fake.dialogs.boxes.empty());
 }
 

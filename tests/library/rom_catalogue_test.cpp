@@ -7,37 +7,6 @@
 
 #include <gtest/gtest.h>
 
-namespace {
-
-// A refresh shown by the list model as one line: each row's path under the root, the first
-// and last progress calls, and the window's caption (first load without a search). Progress
-// never goes back and, while a search is matched, misses at most a thousandth of the names.
-QString refreshed(RomCatalogue& catalogue, RomListModel& model, const QString& root,
-                  const QStringList& folders, const QString& pattern, const QString& search) {
-    std::vector<std::pair<qint64, qint64>> calls;
-    RomRows rows = catalogue.refresh(folders, pattern, search, [&](qint64 done, qint64 total) {
-        calls.emplace_back(done, total);
-    });
-    if (calls.empty())
-        return "no progress";
-    model.clear(); // as the window does once the folders are listed
-    model.setRows(rows.folders, std::move(rows.names), rows.rowFolders);
-    QStringList shown;
-    for (int row = 0; row < model.rowCount(); ++row)
-        shown << QDir(root).relativeFilePath(model.rowPath(row));
-    const auto call = [](auto c) { return QString("%1/%2").arg(c.first).arg(c.second); };
-    QString line = shown.join(", ") + " | " + call(calls.front()) + ".." + call(calls.back()) +
-                   " | " + refreshCaption(search.isEmpty(), model.rowCount(), rows.listed);
-    for (std::size_t i = 1; i < calls.size(); ++i) {
-        const qint64 step = calls[i].first - calls[i - 1].first;
-        if (calls[i].second != rows.listed || step < 0 || (!search.isEmpty() && step > 2))
-            line += " then " + call(calls[i]); // 2 of 2500 names: a thousandth
-    }
-    return line;
-}
-
-} // namespace
-
 // Folders in order, each name with its own; a folder gone or a file in its place lists nothing.
 TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
     FakePlatform fake;
@@ -47,6 +16,37 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
     for (int i = 0; i < 2500; ++i)
         fake.writeFile(QString("many/Game %1.rom").arg(i));
     const QString root = fake.root(), a = root + "/a";
+    RomCatalogue catalogue;
+    RomListModel model;
+    const QAbstractItemModelTester tester(&model,
+                                          QAbstractItemModelTester::FailureReportingMode::Fatal);
+    model.addColumn({"Name", "Name", "ROM Name"});
+    model.addColumn({"Path", "Path", "ROM Path"});
+    // A refresh shown by the list model as one line: each row's path under the root, the first
+    // and last progress calls, and the window's caption (first load without a search). Progress
+    // never goes back and, while a search is matched, misses at most a thousandth of the names.
+    const auto refreshed = [&](const QStringList& folders, const QString& pattern,
+                               const QString& search) -> QString {
+        std::vector<std::pair<qint64, qint64>> calls;
+        RomRows rows = catalogue.refresh(folders, pattern, search, [&](qint64 done, qint64 all) {
+            calls.emplace_back(done, all);
+        });
+        if (calls.empty())
+            return "no progress";
+        model.clear(); // as the window does once the folders are listed
+        model.setRows(rows.folders, std::move(rows.names), rows.rowFolders);
+        QStringList shown;
+        for (int row = 0; row < model.rowCount(); ++row)
+            shown << QDir(root).relativeFilePath(model.rowPath(row));
+        const auto call = [](auto c) { return QString("%1/%2").arg(c.first).arg(c.second); };
+        QString line = shown.join(", ") + " | " + call(calls.front()) + ".." + call(calls.back()) +
+                       " | " + refreshCaption(search.isEmpty(), model.rowCount(), rows.listed);
+        for (std::size_t i = 1; i < calls.size(); ++i)
+            if (const qint64 step = calls[i].first - calls[i - 1].first;
+                calls[i].second != rows.listed || step < 0 || (!search.isEmpty() && step > 2))
+                line += " then " + call(calls[i]); // 2 of 2500 names: a thousandth
+        return line;
+    };
     const QStringList folders = {a, root + "/gone", a + "/notes.txt", root + "/b", root + "/many"};
     const char* const cases[][3] = {
         {"*.bin", "", "a/Combat.bin, a/Pitfall.bin, b/Combat.bin | 0/3..3/3 | lum - 3 ROM's Found"},
@@ -57,25 +57,18 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
         {"*.rom", "game 1234",
          "many/Game 1234.rom | 0/2500..2500/2500 | lum - 1 Match out of 2500"},
     };
-    RomCatalogue catalogue;
-    RomListModel model;
-    const QAbstractItemModelTester tester(&model,
-                                          QAbstractItemModelTester::FailureReportingMode::Fatal);
-    model.addColumn({"Name", "Name", "ROM Name"});
-    model.addColumn({"Path", "Path", "ROM Path"});
     for (const auto& [pattern, search, expected] : cases) {
         catalogue.prefetch({a}, "*.bin"); // for other folders: not taken
-        EXPECT_EQ(refreshed(catalogue, model, root, folders, pattern, search), expected);
+        EXPECT_EQ(refreshed(folders, pattern, search), expected);
     }
-    EXPECT_EQ(model.data(model.index(0, 0), Qt::DisplayRole).toString() + " in " +
-                  model.data(model.index(0, 1), Qt::DisplayRole).toString(),
+    EXPECT_EQ(model.index(0, 0).data().toString() + " in " + model.index(0, 1).data().toString(),
               "Game 1234.rom in " + root + "/many");
     EXPECT_EQ(model.rowPath(-1) + model.rowPath(1), "");
 
     // A listing started ahead serves one refresh of the same folders and pattern at most.
     catalogue.prefetch({a}, "*.bin");
-    refreshed(catalogue, model, root, {a}, "*.bin", "");
+    refreshed({a}, "*.bin", "");
     fake.writeFile("a/Late.bin");
-    EXPECT_TRUE(refreshed(catalogue, model, root, {a}, "*.bin", "")
-                    .startsWith("a/Combat.bin, a/Late.bin, a/Pitfall.bin |"));
+    EXPECT_TRUE(
+        refreshed({a}, "*.bin", "").startsWith("a/Combat.bin, a/Late.bin, a/Pitfall.bin |"));
 }

@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <tuple>
-
 // A search text, a name it keeps and a name it drops (either may be absent).
 TEST(SearchExpression, ExpressionTable) {
     const std::tuple<const char*, const char*, const char*> cases[] = {

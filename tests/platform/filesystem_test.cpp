@@ -1,6 +1,5 @@
 #include "support/FakePlatform.h"
 
-#include "platform/Dialogs.h"
 #include "platform/FileSystem.h"
 
 #include <gtest/gtest.h>
@@ -23,10 +22,8 @@ TEST(FileSystem, FileExistAndGetShortPath) {
 }
 
 TEST(FileFilter, WindowsFiltersBecomeQtFilters) {
-    const QString filter =
-        "Image Files (*.jpg,*.bmp,*gif,*png)|*.jpg;*.bmp;*.gif;*.png|All Files (*.*)|*.*";
-    EXPECT_EQ(qtFileFilter(filter),
-              "Image Files (*.jpg,*.bmp,*gif,*png) (*.jpg *.bmp *.gif *.png);;All Files (*.*) (*)");
+    const QString filter = "Pictures (*.jpg,*.png)|*.jpg;*.png|All Files (*.*)|*.*";
+    EXPECT_EQ(qtFileFilter(filter), "Pictures (*.jpg,*.png) (*.jpg *.png);;All Files (*.*) (*)");
     EXPECT_EQ(qtSelectedFilter(filter, 2) + qtSelectedFilter(filter, 3), "All Files (*.*) (*)");
     EXPECT_EQ(qtFileFilter("lum Settings|*.lum"), "lum Settings (*.lum)");
 }

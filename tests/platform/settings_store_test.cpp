@@ -8,9 +8,6 @@
 
 #include <QProcess>
 
-#include <optional>
-#include <tuple>
-
 #include <sys/stat.h>
 
 #include <gtest/gtest.h>
@@ -60,11 +57,8 @@ TEST(SettingsStore, EveryShapeOfTheFileReadsWhatItCanAndLosesNothing) {
             makeUnreadable(fake.iniPath(), bytes);
         if (twist == Fifo)
             ::mkfifo(QFile::encodeName(fake.makeFolder("config/lum") + "/lum.ini"), 0600);
-        if (twist == ReadOnlyFolder)
-            QFile::setPermissions(config + "/lum", QFile::ReadOwner | QFile::ExeOwner);
-        std::optional<DiskFull> full;
-        if (twist == FullDisk)
-            full.emplace(16);
+        ::chmod(QFile::encodeName(config + "/lum"), twist == ReadOnlyFolder ? 0500 : 0700);
+        std::optional<DiskFull> full(std::in_place, twist == FullDisk ? 16 : 1 << 30);
         const NoPermissionOverride asAnyone;
         ASSERT_TRUE(asAnyone.holds());
         IniSettingsStore opened(fake.iniPath());
@@ -78,8 +72,7 @@ TEST(SettingsStore, EveryShapeOfTheFileReadsWhatItCanAndLosesNothing) {
         EXPECT_EQ(done, std::vector<bool>(4, writes));
         EXPECT_TRUE(writes || tree(config) == before);
         full.reset();
-        QFile::setPermissions(config + "/lum",
-                              QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+        ::chmod(QFile::encodeName(config + "/lum"), 0700);
         ASSERT_TRUE(writes || QDir(config).removeRecursively());
         EXPECT_TRUE(store.SaveSetting("winpos", "top", "1"));
         const auto reread = fake.reopenStore();
@@ -89,7 +82,6 @@ TEST(SettingsStore, EveryShapeOfTheFileReadsWhatItCanAndLosesNothing) {
                   odd + "|gone1"); // one entry for names alike but for case
         full.emplace(16);          // after a write that worked, the next failure is told again
         EXPECT_FALSE(store.SaveSetting("winpos", "width", "4905"));
-        full.reset();
         EXPECT_EQ(fake.dialogs.boxes.size(), writes ? 1u : 2u);
         for (const FakeDialogs::Box& box : fake.dialogs.boxes)
             EXPECT_TRUE(box.text.contains(fake.iniPath()) && box.icon == MsgIcon::Exclamation);
@@ -101,9 +93,7 @@ QByteArray resaved(const QByteArray& ini) {
     FakePlatform fake;
     fake.writeFile("config/lum/lum.ini", ini);
     const auto store = fake.reopenStore();
-    const auto resave = [&](const auto&... settings) {
-        (write(*store, settings, read(*store, settings)), ...);
-    };
+    const auto resave = [&](const auto&... s) { (write(*store, s, read(*store, s)), ...); };
     resave(stored::z26Path, stored::romFilter, stored::backColor, stored::textColor,
            stored::backImg, stored::backImgEnabled, stored::mainWindowMaximized, stored::mainWindow,
            stored::settingsWindow, stored::pictureWindow);

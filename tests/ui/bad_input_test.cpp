@@ -1,3 +1,4 @@
+#include "support/FakePlatform.h"
 #include "support/Files.h"
 #include "support/Unreadable.h"
 
@@ -6,9 +7,6 @@
 
 #include <QGuiApplication>
 #include <QScreen>
-#include <QTemporaryDir>
-
-#include <cmath>
 
 #include <sys/stat.h>
 
@@ -33,27 +31,23 @@ TEST(BadInputTwips, AbsurdValuesStayWithinTheDesktop) {
 
 // Background and controller pictures: whatever is at the path, a picture or none.
 TEST(BadInputPictures, AnythingButAPictureOfModestSizeGivesNone) {
-    QTemporaryDir dir;
-    const auto file = [&dir](const char* name, const QByteArray& bytes) {
-        putFile(dir.filePath(name), bytes);
-        return dir.filePath(name);
-    };
+    FakePlatform fake;
     // A JPEG whose header claims 60000 x 60000, its data cut.
     QByteArray huge = encodedPicture(8, 8, "JPG");
     const qsizetype frame = huge.indexOf("\xFF\xC0");
     huge = huge.left(frame + 40).replace(frame + 5, 4, "\xEA\x60\xEA\x60");
-    ASSERT_EQ(::mkfifo(QFile::encodeName(dir.filePath("fifo.jpg")).constData(), 0600), 0);
-    QDir(dir.path()).mkdir("folder.jpg");
+    ASSERT_EQ(::mkfifo(QFile::encodeName(fake.root() + "/fifo.jpg"), 0600), 0);
     const QString none[] = {QString(),
-                            dir.filePath("missing.jpg"),
-                            file("empty.jpg", {}),
-                            file("cut.jpg", encodedPicture(64, 64, "JPG").left(100)),
-                            file("huge.jpg", huge),
-                            file("garbage.jpg", "\xFF\xD8junk"),
-                            makeUnreadable(dir.filePath("locked.jpg"), encodedPicture(8, 8, "PNG")),
-                            dir.filePath("folder.jpg"),
-                            dir.filePath("fifo.jpg")};
+                            fake.root() + "/missing.jpg",
+                            fake.writeFile("empty.jpg"),
+                            fake.writeFile("cut.jpg", encodedPicture(64, 64, "JPG").left(100)),
+                            fake.writeFile("huge.jpg", huge),
+                            fake.writeFile("garbage.jpg", "\xFF\xD8junk"),
+                            makeUnreadable(fake.root() + "/lock.jpg", encodedPicture(8, 8, "PNG")),
+                            fake.makeFolder("folder.jpg"),
+                            fake.root() + "/fifo.jpg"};
     for (const QString& path : none)
         EXPECT_TRUE(loadPictureFile(path).isNull()) << qPrintable(path);
-    EXPECT_EQ(loadPictureFile(file("ok.png", encodedPicture(9, 7, "PNG"))).size(), QSize(9, 7));
+    EXPECT_EQ(loadPictureFile(fake.writeFile("ok.png", encodedPicture(9, 7, "PNG"))).size(),
+              QSize(9, 7));
 }

@@ -7,8 +7,6 @@
 
 #include <gtest/gtest.h>
 
-#include <functional>
-
 // The list's own text drawing must be indistinguishable from the style's, whatever the
 // name: short, cut off with an ellipsis, not Latin, right to left, empty, selected; and it
 // must follow the column's width and the list's font when they change.
