@@ -1,7 +1,6 @@
 #include "support/Boxes.h"
 #include "support/Files.h"
 #include "support/LocalHttpServer.h"
-#include "support/Unreadable.h"
 #include "support/WidgetDump.h"
 #include "support/Widgets.h"
 

@@ -46,24 +46,6 @@ TEST(OptionRules, ThePortsDecideTheLightGunTheDevicesAndTheLayouts) {
     }
 }
 
-TEST(OptionRules, FieldsFollowTheirBoxesAndTheKeyboardPaddleAnExactCheck) {
-    EmulatorOptions o;
-    OptionStates s = optionStates(o);
-    EXPECT_FALSE(s.scanLinesField || s.startLineField || s.lowerSensitivityField ||
-                 s.customFrameRateField);
-    EXPECT_TRUE(s.keyboardPaddle);
-    o.scanLineLimit = o.startLineEnabled = o.lowerSensitivity = Check::Grayed;
-    o.frameRate = FrameRate::Custom;
-    o.inactiveKeyboard = Check::Grayed;
-    s = optionStates(o);
-    EXPECT_TRUE(s.scanLinesField && s.startLineField && s.lowerSensitivityField &&
-                s.customFrameRateField && s.keyboardPaddle);
-    o.frameRate = FrameRate::Monitor;
-    o.inactiveKeyboard = Check::On;
-    s = optionStates(o);
-    EXPECT_FALSE(s.customFrameRateField || s.keyboardPaddle);
-}
-
 TEST(OptionRules, TidyingGivesTheNumberFieldsTheirLeadingNumber) {
     for (const auto& [typed, tidy] :
          {std::pair{"0012", "12"}, {"", "0"}, {"2.50", "2.5"}, {"12abc", "12"}, {"abc", "0"}}) {

@@ -1,7 +1,7 @@
 #include "library/CCRC32.h"
 
 #include "support/Boxes.h"
-#include "support/Unreadable.h"
+#include "support/Files.h"
 
 #include <numeric>
 #include <random>

@@ -2,7 +2,7 @@
 #include "library/GameDatabase.h"
 
 #include "support/FakePlatform.h"
-#include "support/Unreadable.h"
+#include "support/Files.h"
 
 #include <QFileInfo>
 

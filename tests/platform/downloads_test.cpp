@@ -1,4 +1,3 @@
-#include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 #include "support/Files.h"
 #include "support/LocalHttpServer.h"

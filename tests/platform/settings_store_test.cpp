@@ -1,7 +1,5 @@
-#include "support/DiskFull.h"
 #include "support/FakePlatform.h"
 #include "support/Files.h"
-#include "support/Unreadable.h"
 
 #include "platform/ReportingSettingsStore.h"
 #include "platform/StoredSettings.h"

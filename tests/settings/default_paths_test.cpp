@@ -122,13 +122,6 @@ TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
     EXPECT_EQ(rows(*w), QStringList({a + " 1 on", a + " 1 on", b + " 2 on"}));
     EXPECT_EQ(stored("ROM3Path"), b);
 
-    // Drops without a local item are ignored, on the list and on the emulator's box.
-    for (QWidget* onto : {target, static_cast<QWidget*>(control<QLineEdit>(*w, "txtDefPathz26"))})
-        for (const QList<QUrl>& urls : {QList<QUrl>{}, QList<QUrl>{QUrl("ftp://example.org/z26")}})
-            drop(onto, urls);
-    EXPECT_TRUE(fake.dialogs.boxes.empty());
-    EXPECT_EQ(stored("Z26Path"), "<missing>");
-
     // A name ending in .rar is refused as an archive, even when it is a folder.
     w->AddRomFolder(fake.writeFile("game.bin"), false);
     drop(target, {QUrl::fromLocalFile(fake.root() + "/missing")});

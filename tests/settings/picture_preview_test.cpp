@@ -1,7 +1,6 @@
 #include "SettingsFixture.h"
 #include "support/Files.h"
 
-#include "settings/PictureFit.h"
 #include "settings/frmPicPreview.h"
 #include "ui/Twips.h"
 
@@ -23,12 +22,6 @@ protected:
 };
 
 } // namespace
-
-TEST(PicturePreviewFit, APictureWithoutASizeOrABoxWithoutRoomShowsNothing) {
-    EXPECT_EQ(FitPictureToBox({0, 100}, 500, 500), std::nullopt);
-    EXPECT_EQ(FitPictureToBox({100, 0}, 500, 500), std::nullopt);
-    EXPECT_EQ(FitPictureToBox({100, 100}, 0, 500), (PictureFit{0, 0, 0, 0}));
-}
 
 TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensInPlace) {
     // (Every shape of a file that is no picture is read by the picture loader's own test.)
@@ -66,11 +59,6 @@ TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensI
               "Paddle Control Layout " + fake.programFolder().toStdString() + "/a.jpg");
     EXPECT_EQ(preview->PPPic->size(), QSize(800, 600));
     EXPECT_EQ(fake.dialogs.boxes.size(), std::size(bad) + 1);
-    // Minimized, it leaves the picture where it was.
-    preview->setWindowState(Qt::WindowMinimized);
-    ASSERT_TRUE(preview->showPicture(picture("b.jpg", 400, 100), "Paddle Control Layout"));
-    EXPECT_EQ(preview->PPImg->geometry(), QRect(100, 0, 400, 300));
-    preview->setWindowState(Qt::WindowNoState);
 
     preview->move(twips::toPixelsX(900), twips::toPixelsY(600));
     QCoreApplication::processEvents();

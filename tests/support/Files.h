@@ -1,5 +1,7 @@
 #pragma once
 
+// Files for the tests: their bytes, pictures, and the disks and permissions that refuse them.
+
 #include <QBuffer>
 #include <QByteArray>
 #include <QDir>
@@ -7,6 +9,14 @@
 #include <QImage>
 #include <QString>
 #include <QStringList>
+
+#include <csignal>
+#include <cstring>
+
+#include <linux/capability.h>
+#include <sys/resource.h>
+#include <sys/syscall.h>
+#include <unistd.h>
 
 // A file's bytes; a marker when it cannot be read, so that a lost file never compares equal.
 inline QByteArray fileBytes(const QString& path) {
@@ -36,3 +46,74 @@ inline QByteArray encodedPicture(int width, int height, const char* format) {
     image.save(&buffer, format);
     return bytes;
 }
+
+// While it lives, files cannot grow past `bytes`: writes fail as they do on a full disk.
+// (Tests run as root, which passes every permission check, but not this.)
+class DiskFull {
+public:
+    explicit DiskFull(rlim_t bytes) {
+        getrlimit(RLIMIT_FSIZE, &m_saved);
+        m_oldHandler = std::signal(SIGXFSZ, SIG_IGN); // a failed write, not a dead process
+        rlimit limit = m_saved;
+        limit.rlim_cur = bytes;
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~DiskFull() {
+        setrlimit(RLIMIT_FSIZE, &m_saved);
+        std::signal(SIGXFSZ, m_oldHandler);
+    }
+    DiskFull(const DiskFull&) = delete;
+    DiskFull& operator=(const DiskFull&) = delete;
+
+private:
+    rlimit m_saved{};
+    void (*m_oldHandler)(int) = nullptr;
+};
+
+// A file that exists but cannot be read; returns its path, or the empty text when it could
+// not be made. Any file already there is replaced. For an ordinary user it is `content`
+// with no permission bits. Root reads through any permission bits, so for root a link to
+// /proc/self/mem stands in: it opens like a regular file, and every read at its start
+// fails (EIO).
+inline QString makeUnreadable(const QString& path, const QByteArray& content = {}) {
+    QFile::remove(path);
+    if (geteuid() == 0)
+        return QFile::link(QStringLiteral("/proc/self/mem"), path) ? path : QString();
+    QFile file(path);
+    if (!file.open(QIODevice::WriteOnly) || file.write(content) != content.size())
+        return QString();
+    file.close();
+    return QFile::setPermissions(path, {}) ? path : QString();
+}
+
+// While it lives, the calling thread has no power to pass over permission bits: a file or
+// folder without them refuses root as it refuses anyone (open and opendir fail with
+// EACCES), so tests of unreadable files and folders run as root too. It drops only the
+// thread's effective capabilities that override read and search permissions, and gives
+// them back when it ends; for other users it does nothing.
+class NoPermissionOverride {
+public:
+    NoPermissionOverride() {
+        if (syscall(SYS_capget, &m_header, m_saved) != 0)
+            return;
+        __user_cap_data_struct lowered[2];
+        std::memcpy(lowered, m_saved, sizeof lowered);
+        lowered[0].effective &= ~((1u << CAP_DAC_OVERRIDE) | (1u << CAP_DAC_READ_SEARCH));
+        m_lowered = syscall(SYS_capset, &m_header, lowered) == 0;
+    }
+    ~NoPermissionOverride() {
+        if (m_lowered)
+            syscall(SYS_capset, &m_header, m_saved);
+    }
+    NoPermissionOverride(const NoPermissionOverride&) = delete;
+    NoPermissionOverride& operator=(const NoPermissionOverride&) = delete;
+
+    // False when root kept its override (the capabilities could not be changed): a test
+    // that needs a refused read must then skip.
+    bool holds() const { return geteuid() != 0 || m_lowered; }
+
+private:
+    __user_cap_header_struct m_header{_LINUX_CAPABILITY_VERSION_3, 0};
+    __user_cap_data_struct m_saved[2]{};
+    bool m_lowered = false;
+};

@@ -1,20 +1,9 @@
 #include "support/WidgetDump.h"
 
-#include <QAbstractButton>
-#include <QAbstractItemView>
-#include <QAction>
-#include <QComboBox>
+#include "support/Widgets.h"
+
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
-#include <QGroupBox>
-#include <QHeaderView>
-#include <QLabel>
-#include <QLineEdit>
-#include <QMenu>
-#include <QTabBar>
-#include <QTabWidget>
-#include <QWidget>
 
 #include <gtest/gtest.h>
 
@@ -125,14 +114,6 @@ void dumpWidget(const QWidget& w, int depth, QStringList& lines) {
             dumpWidget(*widget, inner, lines);
 }
 
-QString goldenPath(const QString& name) {
-    const QByteArray source = qgetenv("LUM_SOURCE_DIR");
-    const QString root = !source.isEmpty() ? QString::fromLocal8Bit(source)
-                                           : QFileInfo(QStringLiteral(__FILE__)).absolutePath() +
-                                                 QStringLiteral("/../..");
-    return QDir::cleanPath(root + QStringLiteral("/tests/golden/") + name + QStringLiteral(".txt"));
-}
-
 } // namespace
 
 QString dumpWidgetTree(const QWidget& window) {
@@ -151,8 +132,18 @@ QObject* findControl(const QObject& window, const QString& name, const char* cla
     std::abort();
 }
 
+QString sourcePath(const QString& relative) {
+    const QByteArray source = qgetenv("LUM_SOURCE_DIR");
+    // Run by hand, outside ctest: the tree this file lies in.
+    const QString root = !source.isEmpty() ? QString::fromLocal8Bit(source)
+                                           : QFileInfo(QStringLiteral(__FILE__)).absolutePath() +
+                                                 QStringLiteral("/../..");
+    return QDir::cleanPath(root + u'/' + relative);
+}
+
 void expectGolden(const QString& name, const QString& dump) {
-    const QString path = goldenPath(name);
+    const QString path =
+        sourcePath(QStringLiteral("tests/golden/") + name + QStringLiteral(".txt"));
     if (!qgetenv("LUM_UPDATE_GOLDEN").isEmpty()) {
         QFile out(path);
         ASSERT_TRUE(out.open(QIODevice::WriteOnly | QIODevice::Truncate)) << path.toStdString();

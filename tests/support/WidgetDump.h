@@ -18,6 +18,9 @@ template <class T> T* control(const QObject& window, const QString& name) {
     return static_cast<T*>(findControl(window, name, T::staticMetaObject.className()));
 }
 
+// A file of the source tree, by its path from the tree's top.
+QString sourcePath(const QString& relative);
+
 // Compares `dump` with tests/golden/<name>.txt. With LUM_UPDATE_GOLDEN=1 in the
 // environment the file is written instead; commit it after reading its diff.
 void expectGolden(const QString& name, const QString& dump);

@@ -3,6 +3,7 @@
 // The Qt widgets, events and test tools that the window tests reach their controls with.
 
 #include <QAbstractButton>
+#include <QAbstractItemView>
 #include <QAction>
 #include <QApplication>
 #include <QCheckBox>

@@ -1,6 +1,5 @@
 #include "support/FakePlatform.h"
 #include "support/Files.h"
-#include "support/Unreadable.h"
 
 #include "ui/PictureFile.h"
 #include "ui/Twips.h"
