@@ -59,24 +59,6 @@ TEST(DefaultPathsRules, ArchiveNamesAndTheEmulatorsPath) {
         EXPECT_EQ(z26PathForDisplay(QString::fromUtf8(text)), QString::fromUtf8(expected)) << text;
 }
 
-TEST_F(DefaultPaths, FoldersGoneFromDiskAreDroppedFromTheStoreAtOnce) {
-    const QString b = romFolder("b");
-    const QString c = romFolder("c");
-    storeFolder(1, b, true);
-    EXPECT_EQ(loadExistingRomFolders(fake.store), (std::vector<RomFolder>{{b, true}}));
-    EXPECT_EQ(stored("ROM2Path"), "<missing>"); // nothing is written while every folder exists
-
-    storeFolder(1, fake.root() + "/gone", true);
-    storeFolder(2, fake.writeFile("file.bin"), true); // a file where a folder belongs
-    storeFolder(3, b, false);
-    storeFolder(4, c, true);
-    const std::vector<RomFolder> expected = {{b, false}, {c, true}};
-    EXPECT_EQ(loadExistingRomFolders(fake.store), expected);
-    // Closed up at once, so the main list still reaches b and c.
-    EXPECT_EQ(readRomFolders(*fake.reopenStore()), expected);
-    EXPECT_EQ(stored("ROM3Path"), "");
-}
-
 // Counting lists every folder, so a window still hidden counts when it is shown.
 TEST_F(DefaultPaths, ThePageCountsExistingFoldersWithThePatternAndReloadsOnItsTab) {
     fake.store.SaveSetting("Settings", "ROMFilter", "*.a26");
@@ -84,9 +66,12 @@ TEST_F(DefaultPaths, ThePageCountsExistingFoldersWithThePatternAndReloadsOnItsTa
     const QString b = romFolder("b with blank", {"1.bin"});
     storeFolder(1, a, false);
     storeFolder(2, fake.root() + "/gone", true);
-    storeFolder(3, b, true);
+    storeFolder(3, fake.writeFile("file.bin"), true); // a file where a folder belongs
+    storeFolder(4, b, true);
     auto w = std::make_unique<frmSettings>(fake.platform);
     EXPECT_EQ(rows(*w), QStringList({a + "  off", b + "  on"}));
+    // Folders gone from disk leave the store at once, so the main list still reaches b.
+    EXPECT_EQ(readRomFolders(*fake.reopenStore()), (std::vector<RomFolder>{{a, false}, {b, true}}));
     w->show();
     EXPECT_EQ(rows(*w), QStringList({a + " 2 off", b + " 0 on"}));
     auto* filter = control<QLineEdit>(*w, "txtDefPathFilter");
