@@ -114,7 +114,7 @@ void frmMain::showConfigCaption(const QString& text, const QString& tip) {
 }
 
 void frmMain::createMenus() {
-    auto item = [this](QMenu* menu, const char* name, const char* caption) {
+    auto item = [](QMenu* menu, const char* name, const char* caption) {
         QAction* action = menu->addAction(QString::fromUtf8(caption));
         action->setObjectName(QLatin1String(name));
         return action;

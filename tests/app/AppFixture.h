@@ -41,9 +41,9 @@ protected:
         window->show();
         return *window;
     }
+    frmMain& reload() { return window.reset(), load(); } // the next start: the old one gone
 
     QAction* action(const char* name) const { return control<QAction>(*window, name); }
-    // The window's title and the rows' names.
     QString listing() const {
         QStringList names;
         for (int row = 0; row < window->listModel().rowCount(); ++row)

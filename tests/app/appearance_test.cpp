@@ -14,12 +14,11 @@ TEST_F(MainWindow, ColourAndPictureCommands) {
     const auto look = [this] {
         const QString picture =
             list()->hasPicture() ? QFileInfo(list()->Picture()).completeBaseName() : "-";
-        QString out = QString::asprintf("%x/%x %s %s | ", list()->BackColor(), list()->ForeColor(),
+        QString out = QString::asprintf("%x/%x %s %s |", list()->BackColor(), list()->ForeColor(),
                                         qPrintable(picture),
                                         action("mnuBackImgEnabled")->isChecked() ? "on" : "off");
-        out += QStringList({stored("BackColor"), stored("TextColor"), stored("BackImgEnabled"),
-                            QFileInfo(stored("BackImg")).completeBaseName()})
-                   .join(' ');
+        for (const char* key : {"BackColor", "TextColor", "BackImgEnabled", "BackImg"})
+            out += ' ' + stored(key).replace(fake.root(), "~");
         for (const vbalProgressBar* bar : window->findChildren<vbalProgressBar*>() +
                                               settings().findChildren<vbalProgressBar*>()) {
             const QImage image = bar->BarPicture();
@@ -34,36 +33,30 @@ TEST_F(MainWindow, ColourAndPictureCommands) {
     fake.dialogs.paths = {"", fake.writeFile("junk.png", "not a picture")};
     const char* const steps[][2] = {
         // the menu item, "" to start again
-        {"mnuBackColorChange", "ff/ffff teal on | 255 65535 <missing> teal"},
-        {"mnuTextColor", "ff/ff0000 teal on | 255 16711680 <missing> teal"},
-        {"mnuBackImgEnabled", "ff/ff0000 - off | 255 16711680 False teal"},
-        {"", "ff/ff0000 - off | 255 16711680 False teal"},
-        {"mnuBackImgEnabled", "ff/ff0000 teal on | 255 16711680 True teal"},
-        {"mnuTextColor", "ff/ff0000 teal on | 255 16711680 True teal"},
-        {"mnuBackColorChange", "ff00/ff00ff - off | 65280 16711935 False teal"},
-        {"mnuBackImgChange", "ff00/ff00ff teal on | 65280 16711935 True teal"},
+        {"mnuBackColorChange", "ff/ffff teal on | 255 65535 <missing> ~/teal.png"},
+        {"mnuTextColor", "ff/ff0000 teal on | 255 16711680 <missing> ~/teal.png"},
+        {"mnuBackImgEnabled", "ff/ff0000 - off | 255 16711680 False ~/teal.png"},
+        {"", "ff/ff0000 - off | 255 16711680 False ~/teal.png"},
+        {"mnuBackImgEnabled", "ff/ff0000 teal on | 255 16711680 True ~/teal.png"},
+        {"mnuTextColor", "ff/ff0000 teal on | 255 16711680 True ~/teal.png"},
+        {"mnuBackColorChange", "ff00/ff00ff - off | 65280 16711935 False ~/teal.png"},
+        {"mnuBackImgChange", "ff00/ff00ff teal on | 65280 16711935 True ~/teal.png"},
         // A picture that cannot be shown shows none, without a word, its name kept.
-        {"mnuBackImgChange", "ff00/ff00ff - on | 65280 16711935 True junk"},
-        {"", "ff00/ff00ff - on | 65280 16711935 True junk"},
-    };
+        {"mnuBackImgChange", "ff00/ff00ff - on | 65280 16711935 True ~/junk.png"},
+        {"", "ff00/ff00ff - on | 65280 16711935 True ~/junk.png"}};
     for (const auto& [item, expected] : steps) {
         settings(); // built, so that each command brings its bars along
-        if (*item) {
+        if (*item)
             action(item)->trigger();
-        } else {
-            window.reset();
-            load();
-        }
+        else
+            reload();
         EXPECT_EQ(look(), expected) << item;
     }
     EXPECT_EQ(happened(), "");
     EXPECT_EQ(fake.dialogs.colourTitles, QStringList(4, "Choose a Color"));
     EXPECT_EQ(fake.dialogs.colourInitials, (std::vector<quint32>{255, 65535, 0xFF0000, 255}));
-    const FileDialogRequest& r = fake.dialogs.fileRequests.back().request;
-    EXPECT_EQ(QStringList({r.title, r.initialFolder, QString::number(r.flags, 16), r.filter,
-                           QString::number(r.filterIndex)})
-                  .join(" | "),
-              "Choose Image File | " + fake.programFolder() +
-                  "/Backgrounds | 1800 | Image Files (*.jpg,*.bmp,*gif,*png)|*.jpg;*.bmp;*.gif;"
-                  "*.png|All Files (*.*)|*.* | 1");
+    EXPECT_EQ(requestLines(fake.dialogs),
+              Lines(2, "open | Choose Image File | Image Files "
+                       "(*.jpg,*.bmp,*gif,*png)|*.jpg;*.bmp;*.gif;*.png|All Files (*.*)|*.* | " +
+                           fake.programFolder().toStdString() + "/Backgrounds | 1 | 1800"));
 }

@@ -7,8 +7,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     const QString name = "River Raid (it's \"good\") $HOME.bin"; // one argument, as it is
     storePaths({name, "Space Invaders.bin"});
     fake.makeFolder("named/z26");
-    load();
-    window->LoadROM(); // nothing selected yet
+    load().LoadROM(); // nothing selected yet
     EXPECT_EQ(happened(), "");
     list()->setCurrentIndex(window->listModel().index(1, 0));
     const QString run = "~/emu/z26 ~/roms/Space Invaders.bin";
@@ -16,8 +15,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
         {"", "Invalid z26 Path | z26 path isn't valid.\n\nTry removing the z26 path and "
              "re-adding it to correct the problem. | Ok | Exclamation"},
         {"/named", ""}, // a folder whose z26 is a folder
-        {"/emu", run + " -p8 -M1"},
-    };
+        {"/emu", run + " -p8 -M1"}};
     for (const auto& [path, outcome] : paths) {
         set("Z26Path", *path ? fake.root() + path : "");
         fake.shell.succeed = false;
@@ -42,8 +40,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
         {Cancel, "0", noControllers},
         {Yes, "0",
          question + "\npage PaddlesAudio\ntip txtLowerSens 3 | Zero Value | Number Cannot Be Zero"},
-        {Yes, "2", run + " -)NC -(NC -P2 -M1\n" + question},
-    };
+        {Yes, "2", run + " -)NC -(NC -P2 -M1\n" + question}};
     for (const auto& [answer, sensitivity, outcome] : answers) {
         o.lowerSensitivityBy = sensitivity;
         settings().setOptions(o);

@@ -1,36 +1,31 @@
 #include "AppFixture.h"
 
 #include "emulator/OptionFile.h"
+#include "support/SampleOptions.h"
 
 // Without both paths the first one missing is asked for; Default.lum's options as read at
 // start wait for the settings window, built when first needed.
 TEST_F(MainWindow, StartsFromTheStoredPathsAndDefaultLum) {
-    fake.writeFile("emu/z26");
-    storeFolder(1, "roms", {"a.bin", "b.bin"});
-    EmulatorOptions sample;
-    sample.gameType = 5;
-    // Folders of the emulator and the ROMs, Default.lum (none when empty), the outcome.
+    storePaths({"a.bin", "b.bin"});
+    // Folders of the emulator and the ROMs, Default.lum (at first none), the outcome.
     const std::tuple<const char*, const char*, QByteArray, const char*> starts[] = {
         {"", "roms", QByteArray(),
          "lum 0\nChoose z26 Path | You need to select you z26 path before you continue. | Ok | "
          "None\npage DefaultPaths\nDefault.lum couldn't be loaded / Default.lum need's to be in "
          "the same folder as lum.exe\ngame type 0"},
-        {"emu", "", encodeOptions(sample).left(100),
+        {"emu", "", encodeOptions(sampleOptions()).left(100),
          "lum 0\nlum | .lum file is corrupt\r\nPlease verify settings and re-save to correct "
          "this problem | Ok | None\nChoose ROM's Path | You need to select you ROM's path before "
          "you continue. | Ok | None\npage DefaultPaths\nDefault.lum is corrupt.  Please verify "
          "settings and re-save to correct the problem. / \ngame type 0"},
-        {"emu", "roms", encodeOptions(sample),
-         "lum - 2 ROM's Found 2\n\nDefault.lum was succesfully loaded / \ngame type 5"},
-    };
+        {"emu", "roms", encodeOptions(sampleOptions()),
+         "lum - 2 ROM's Found 2\n\nDefault.lum was succesfully loaded / \ngame type 13"}};
     for (const auto& [z26, roms, lum, expected] : starts) {
         set("Z26Path", *z26 ? fake.root() + "/" + z26 : "");
         storeFolder(1, roms);
-        QFile::remove(fake.programFolder() + "/Default.lum");
         if (!lum.isEmpty())
             fake.writeFile("program/Default.lum", lum);
-        window.reset();
-        frmMain& w = load();
+        frmMain& w = reload();
         QString outcome = w.windowTitle() + ' ' + QString::number(w.listModel().columnCount()) +
                           '\n' + happened();
         fake.writeFile("program/Default.lum", encodeOptions(EmulatorOptions())); // not read
@@ -44,8 +39,12 @@ TEST_F(MainWindow, StartsFromTheStoredPathsAndDefaultLum) {
 }
 
 // In twips, 15 a pixel at 96 dpi; closed maximised or minimised, the normal place stays.
-TEST_F(MainWindow, PlaceAndSize) {
+// The documents come from the emulator's folder, whether the stored path names the folder
+// or the program; Exit closes every window, the settings window storing its place.
+TEST_F(MainWindow, KeepsItsPlaceAndItsMenusReachDocumentsPagesOptionSetsAndWindows) {
     storePaths();
+    for (const char* file : {"README.TXT", "copying.txt", "Z26"}) // lower case as often unpacked
+        fake.writeFile(QString("emu/") + file);
     for (const auto& [key, value] :
          {std::pair{"height", "7200"}, {"width", "6000"}, {"top", "900"}, {"left", "1500"}})
         fake.store.SaveSetting("winpos", key, value);
@@ -67,31 +66,21 @@ TEST_F(MainWindow, PlaceAndSize) {
     };
     EXPECT_EQ(closed(), "False 900 1500 7950 4800");
     EXPECT_EQ(stored("top", "setpos"), "<missing>"); // the settings window was never built
-    window.reset();
-    load().showMaximized();
+    reload().showMaximized();
     QCoreApplication::processEvents(); // the window takes the screen's size
     EXPECT_EQ(closed(), "True 900 1500 7950 4800");
-    window.reset();
-    EXPECT_TRUE(load().isMaximized()); // as it was left
+    EXPECT_TRUE(reload().isMaximized()); // as it was left
     window->showNormal();
     window->resize(600, 600);
     window->showMinimized();
     EXPECT_EQ(closed(), "True 900 1500 7950 4800");
-}
 
-// The documents come from the emulator's folder, whether the stored path names the folder
-// or the program; Exit closes every window, the settings window storing its place.
-TEST_F(MainWindow, MenusReachDocumentsPagesOptionSetsAndWindows) {
-    storePaths();
-    for (const char* file : {"README.TXT", "copying.txt", "Z26"}) // lower case as often unpacked
-        fake.writeFile(QString("emu/") + file);
-    load();
+    reload();
     const char* const cases[][3] = {
         {"", "mnuAboutz26Readme", "Error | Error loading README.TXT | Ok | Exclamation"},
         {"emu/Z26", "mnuAboutz26Readme", "open ~/emu/README.TXT"},
         {"emu", "mnuAboutz26Readme", "open ~/emu/README.TXT"},
-        {"emu", "mnuAboutCopying", "open ~/emu/copying.txt"},
-    };
+        {"emu", "mnuAboutCopying", "open ~/emu/copying.txt"}};
     for (const auto& [z26, item, outcome] : cases) {
         set("Z26Path", *z26 ? fake.root() + "/" + z26 : "");
         action(item)->trigger();
@@ -101,19 +90,15 @@ TEST_F(MainWindow, MenusReachDocumentsPagesOptionSetsAndWindows) {
     action("mnuAboutCopying")->trigger();
     EXPECT_EQ(happened(),
               "open ~/emu/copying.txt\nError | Error loading COPYING.TXT | Ok | Exclamation");
-    action("mnuAboutz26HomePage")->trigger();
-    action("mnuAboutlumHomePage")->trigger();
-    const QStringList pages = happened().split('\n');
-    EXPECT_TRUE(pages.size() == 2 && pages[0] != pages[1] && pages.filter("open https://") == pages)
-        << pages.join(' ').toStdString();
-
-    action("mnuFileSaveSettings")->trigger(); // each asks for its file, and is cancelled
-    action("mnuFileLoadSettings")->trigger();
-    const auto& asked = fake.dialogs.fileRequests;
+    for (const char* item : {"mnuAboutz26HomePage", "mnuAboutlumHomePage", "mnuFileSaveSettings",
+                             "mnuFileLoadSettings", "mnuSettingsConfiguration", "mnuAboutlumAbout"})
+        action(item)->trigger();
+    const QStringList seen = happened().split('\n');
+    EXPECT_TRUE(seen.size() == 4 && seen[0] != seen[1] && seen.filter("open https://").size() == 2)
+        << seen.join(' ').toStdString();
+    EXPECT_EQ(seen.mid(2), QStringList({"about", "page Settings"}));
+    const auto& asked = fake.dialogs.fileRequests; // Save's, then Load's: both cancelled
     EXPECT_TRUE(asked.size() == 2 && asked[0].save && !asked[1].save);
-    action("mnuSettingsConfiguration")->trigger();
-    action("mnuAboutlumAbout")->trigger();
-    EXPECT_EQ(happened(), "about\npage Settings");
     settings().move(200, 80);
     action("mnuFileExit")->trigger();
     EXPECT_EQ(happened() + (window->isVisible() ? "main" : ""), "");

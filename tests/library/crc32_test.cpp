@@ -10,11 +10,9 @@
 
 #include <gtest/gtest.h>
 
-namespace {
-
 // The CRC-32 bit by bit, as the yardstick: each bit of a byte, lowest first, meets the running
 // value's lowest bit, which decides whether the polynomial goes in.
-quint32 referenceCrc(QByteArrayView bytes) {
+static quint32 referenceCrc(QByteArrayView bytes) {
     quint32 crc = ~0u;
     for (const char byte : bytes)
         for (int bit = 0; bit < 8; ++bit)
@@ -22,7 +20,7 @@ quint32 referenceCrc(QByteArrayView bytes) {
     return ~crc;
 }
 
-QByteArray randomBytes(qsizetype size) {
+static QByteArray randomBytes(qsizetype size) {
     static std::mt19937 rng(1);
     QByteArray bytes(size, Qt::Uninitialized);
     std::generate(bytes.begin(), bytes.end(), [] { return char(rng()); });
@@ -36,28 +34,23 @@ TEST(Crc32, EveryFileGivesTheCrcOfItsBytesOrZeroAndOneBox) {
     CCRC32 crc(fake.dialogs);
     std::vector<float> progress;
     QObject::connect(&crc, &CCRC32::Progress, [&](float value) { progress.push_back(value); });
-    using Case = std::tuple<QString, quint32, std::vector<qsizetype>, const char*>;
-    const auto randomFile = [&](const std::vector<qsizetype>& chunks) {
-        const QByteArray bytes = randomBytes(std::reduce(chunks.begin(), chunks.end()));
-        return Case{fake.writeFile(QString::number(bytes.size()), bytes), referenceCrc(bytes),
-                    chunks, nullptr};
-    };
     const QString readOnly = fake.writeFile("read-only.bin", "123456789");
     const QString locked = fake.writeFile("locked.bin"), fifo = fake.root() + "/pipe";
-    ASSERT_TRUE(QFile::setPermissions(readOnly, QFile::ReadOwner) &&
-                QFile::setPermissions(locked, {}) && ::mkfifo(QFile::encodeName(fifo), 0600) == 0);
-    const Case cases[] = {randomFile({}),
-                          randomFile({32768}),
-                          randomFile({32767, 2}),
-                          randomFile({32767, 32767, 2}),
-                          {readOnly, 0xCBF43926u, {9}, nullptr}, // the check value
-                          {fake.root() + "/no such.bin", 0, {}, "Error: 53. File not found"},
-                          {QString(), 0, {}, "Error: 53. File not found"},
-                          {fake.makeFolder("dir"), 0, {}, "Error: 75. Path/File access error"},
-                          {fifo, 0, {}, "Error: 75. Path/File access error"},
-                          {locked, 0, {}, "Error: 70. Permission denied"}};
     const NoPermissionOverride asAnyone;
-    ASSERT_TRUE(asAnyone.holds());
+    ASSERT_TRUE(asAnyone.holds() && QFile::setPermissions(readOnly, QFile::ReadOwner) &&
+                QFile::setPermissions(locked, {}) && ::mkfifo(QFile::encodeName(fifo), 0600) == 0);
+    std::vector<std::tuple<QString, quint32, std::vector<qsizetype>, const char*>> cases = {
+        {readOnly, 0xCBF43926u, {9}, nullptr}, // the check value
+        {fake.root() + "/no such.bin", 0, {}, "Error: 53. File not found"},
+        {QString(), 0, {}, "Error: 53. File not found"},
+        {fake.makeFolder("dir"), 0, {}, "Error: 75. Path/File access error"},
+        {fifo, 0, {}, "Error: 75. Path/File access error"},
+        {locked, 0, {}, "Error: 70. Permission denied"}};
+    for (const auto& chunks : {std::vector<qsizetype>{}, {32768}, {32767, 2}, {32767, 32767, 2}}) {
+        const QByteArray bytes = randomBytes(std::reduce(chunks.begin(), chunks.end()));
+        cases.emplace_back(fake.writeFile(QString::number(bytes.size()), bytes),
+                           referenceCrc(bytes), chunks, nullptr);
+    }
     for (const auto& [path, value, chunks, error] : cases) {
         SCOPED_TRACE(path.toStdString());
         const double size = double(std::reduce(chunks.begin(), chunks.end()));
@@ -89,5 +82,3 @@ TEST(Crc32Kernels, AgreeWithTheReferenceForEveryLengthAndAlignment) {
                           referenceCrc(data.sliced(offset, qsizetype(length))))
                     << "length " << length << " offset " << offset;
 }
-
-} // namespace

@@ -22,9 +22,8 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
                                           QAbstractItemModelTester::FailureReportingMode::Fatal);
     model.addColumn({"Name", "Name", "ROM Name"});
     model.addColumn({"Path", "Path", "ROM Path"});
-    // A refresh shown by the list model as one line: each row's path under the root, the first
-    // and last progress calls, and the window's caption (first load without a search). Progress
-    // never goes back and, while a search is matched, misses at most a thousandth of the names.
+    // A refresh as the list model shows it: the rows' paths, the first and last progress calls,
+    // the caption. Progress never goes back, nor, while searching, steps more than a thousandth.
     const auto refreshed = [&](const QStringList& folders, const QString& pattern,
                                const QString& search) -> QString {
         std::vector<std::pair<qint64, qint64>> calls;

@@ -8,11 +8,10 @@
 
 TEST(GradientBands, RunFromTheStartColourAtTheBottomPastTheTopEdge) {
     // {strip height, band height, bands}: the band is height / 255, at least 1.
-    const std::tuple<int, int, size_t> sizes[] = {
-        {300, 1, 301}, {100, 1, 101}, {600, 2, 301}, {1, 1, 2}};
-    for (const auto& [height, band, count] : sizes) {
+    for (const auto& [height, band, count] :
+         {std::tuple{300, 1, 301}, {100, 1, 101}, {600, 2, 301}, {1, 1, 2}}) {
         const auto bands = gradientBands(height, 0, 0, 0, 255, 255, 255);
-        ASSERT_EQ(bands.size(), count) << height;
+        ASSERT_EQ(int(bands.size()), count) << height;
         EXPECT_EQ(std::tuple(bands.front().bottom, bands.front().top, bands.back().top < 0),
                   std::tuple(height, height - band, true)); // the last above the top edge
     }
