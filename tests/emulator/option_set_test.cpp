@@ -105,25 +105,18 @@ TEST(OptionSet, FlagsSelectTheLastSetButtonOrTheGroupsStart) {
 // a load applies them, comes from the file; the rest keep the base's values.
 TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
     const float nan = std::numeric_limits<float>::quiet_NaN();
+    // A check box of 3 and of -1; the last video mode, none, one past the list; an entry
+    // below -1 and past the controllers and game types; a number not a number; a slider
+    // beyond 32 bits; a sound queue its hundreds do not frame.
     const struct {
-        const char* what;
         int offset;
         bool bSingle;
         float value;
         int firstBad; // in load order, -1 for a good set
-    } cases[] = {
-        {"check box of 3", 14, false, 3, 3},
-        {"check box of -1", 140, false, -1, 40},
-        {"last video mode", 0, false, 8, -1},
-        {"no video mode", 0, false, -1, -1},
-        {"video mode past the list", 0, false, 9, 0},
-        {"list entry below -1", 152, false, -2, 7},
-        {"controller past the list", 154, false, 13, 8},
-        {"game type past the list", 142, false, 14, 41},
-        {"number not a number", 102, true, nan, 29},
-        {"slider beyond 32 bits", 60, true, 3e9f, 13},
-        {"sound queue outside its hundreds", 54, true, 12.5f, 19},
-    };
+    } cases[] = {{14, false, 3, 3},    {140, false, -1, 40}, {0, false, 8, -1},
+                 {0, false, -1, -1},   {0, false, 9, 0},     {152, false, -2, 7},
+                 {154, false, 13, 8},  {142, false, 14, 41}, {102, true, nan, 29},
+                 {60, true, 3e9f, 13}, {54, true, 12.5f, 19}};
     EmulatorOptions base;
     base.player0Hard = base.player1Hard = Check::Grayed;
     for (const auto& c : cases) {
@@ -133,10 +126,10 @@ TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
         else
             putInt16(data, c.offset, static_cast<qint16>(c.value));
         const OptionSetRead read = decodeOptions(data, base);
-        EXPECT_EQ(read.firstBad, c.firstBad) << c.what;
+        EXPECT_EQ(read.firstBad, c.firstBad) << c.offset;
         EXPECT_EQ(read.status,
                   c.firstBad < 0 ? OptionSetRead::Status::Ok : OptionSetRead::Status::Invalid)
-            << c.what;
+            << c.offset;
         if (c.offset == 14) {
             EXPECT_EQ(read.options.dsp, sampleOptions().dsp);
             EXPECT_EQ(read.options.player1Hard, Check::Grayed);
