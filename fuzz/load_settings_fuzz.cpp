@@ -1,6 +1,6 @@
 // An option set loaded into the settings window: any bytes as a .lum file, through
-// frmSettings::LoadSettings into the window's options and controls. One window serves every input; before
-// each one it is put back into its start state, so a finding replays from its file alone.
+// frmSettings::LoadSettings into the window's options and controls. One window serves every input;
+// before each one it is put back into its start state, so a finding replays from its file alone.
 #include "FuzzSupport.h"
 
 #include "emulator/OptionFile.h"
