@@ -105,7 +105,15 @@ int main(int argc, char** argv) {
         QtShell shell;
         QtDownloader network;
         ToolRegistry registry;
-        Platform platform{store, dialogs, shell, QDir::tempPath(), network, registry};
+        Platform platform{store,
+                          dialogs,
+                          shell,
+                          QDir::tempPath(),
+                          network,
+                          registry,
+                          QDir::tempPath(),
+                          QDir::tempPath(),
+                          QDir::tempPath()};
         frmMain window(platform);
         window.resize(400, 600);
         window.show();

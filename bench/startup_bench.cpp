@@ -99,7 +99,8 @@ int runLum(int argc, char** argv, const char* configFile) {
     QtShell shell;
     QtDownloader network;
     ToolRegistry registry;
-    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network, registry};
+    const QString here = QApplication::applicationDirPath();
+    Platform platform{store, dialogs, shell, here, network, registry, here, here, here};
     frmMain window(platform);
     phase("windows");
     FirstPaint watcher(&phase);

@@ -74,7 +74,9 @@ public:
 
 class NoShell final : public Shell {
 public:
-    bool StartProgram(const QString&, const QStringList&, const QString&) override { return false; }
+    bool StartProgram(const QString&, const QStringList&, const QString&, QString*) override {
+        return false;
+    }
     bool OpenUrl(const QString&) override { return false; }
     bool OpenTextFile(const QString&) override { return false; }
     bool OpenFolder(const QString&) override { return false; }
@@ -99,7 +101,8 @@ struct Harness {
     NoShell shell;
     NoNetwork network;
     NoRegistry registry;
-    Platform platform{store, dialogs, shell, dir.path(), network, registry};
+    Platform platform{store,    dialogs,    shell,      dir.path(), network,
+                      registry, dir.path(), dir.path(), dir.path()};
     frmSettings window{platform};
     QString startState = dir.filePath(QStringLiteral("start.lum"));
     QString input = dir.filePath(QStringLiteral("input.lum"));

@@ -22,7 +22,10 @@ int main(int argc, char** argv) {
     QtShell shell;
     QtDownloader network;
     ToolRegistry registry;
-    Platform platform{store, dialogs, shell, QApplication::applicationDirPath(), network, registry};
+    const UserFolders folders = desktopUserFolders();
+    Platform platform{store,       dialogs,  shell,        QApplication::applicationDirPath(),
+                      network,     registry, folders.user, folders.cache,
+                      folders.data};
 
     frmMain window(platform);
     window.Form_Load();

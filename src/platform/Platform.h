@@ -18,4 +18,19 @@ struct Platform {
     QString programFolder;
     Downloader& network;
     Registry& registry;
+    // The user's own folders (no trailing separator): the one that holds lum.ini and the
+    // user's option sets, the one for copies that may be fetched again, and the one for
+    // what z26 writes when its own folder is read-only.
+    QString userFolder;
+    QString cacheFolder;
+    QString dataFolder;
 };
+
+// The user's folders as the desktop names them: $XDG_CONFIG_HOME/lum, $XDG_CACHE_HOME/lum
+// and $XDG_DATA_HOME/lum.
+struct UserFolders {
+    QString user;
+    QString cache;
+    QString data;
+};
+UserFolders desktopUserFolders();

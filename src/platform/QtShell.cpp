@@ -6,8 +6,16 @@
 #include <QUrl>
 
 bool QtShell::StartProgram(const QString& program, const QStringList& arguments,
-                           const QString& workingFolder) {
-    return QProcess::startDetached(program, arguments, workingFolder);
+                           const QString& workingFolder, QString* whyNot) {
+    QProcess process;
+    process.setProgram(program);
+    process.setArguments(arguments);
+    process.setWorkingDirectory(workingFolder);
+    if (process.startDetached())
+        return true;
+    if (whyNot)
+        *whyNot = process.errorString();
+    return false;
 }
 
 bool QtShell::OpenUrl(const QString& url) {

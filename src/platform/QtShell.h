@@ -7,7 +7,7 @@
 class QtShell final : public Shell {
 public:
     bool StartProgram(const QString& program, const QStringList& arguments,
-                      const QString& workingFolder) override;
+                      const QString& workingFolder, QString* whyNot) override;
     bool OpenUrl(const QString& url) override;
     bool OpenTextFile(const QString& path) override;
     bool OpenFolder(const QString& path) override;

@@ -9,9 +9,11 @@ class Shell {
 public:
     virtual ~Shell() = default;
 
-    // Starts `program` with `arguments`, detached. False when it could not be started.
+    // Starts `program` with `arguments`, detached. False when it could not be started, with
+    // the system's reason in `whyNot` when one is asked for.
     virtual bool StartProgram(const QString& program, const QStringList& arguments,
-                              const QString& workingFolder = QString()) = 0;
+                              const QString& workingFolder = QString(),
+                              QString* whyNot = nullptr) = 0;
     virtual bool OpenUrl(const QString& url) = 0;
     // Opens a text file in the user's text editor.
     virtual bool OpenTextFile(const QString& path) = 0;

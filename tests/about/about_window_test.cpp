@@ -273,8 +273,7 @@ TEST_F(About, Downloads) {
 // Closing it while a download waits would delete it under the check.
 TEST_F(About, StaysOpenWhileADownloadWaits) {
     QtDownloader impatient{std::chrono::milliseconds(300)};
-    Platform platform{fake.store,           fake.dialogs, fake.shell,
-                      fake.programFolder(), impatient,    fake.registry};
+    Platform platform = fake.with(impatient);
     QPointer<frmAbout> busy = new frmAbout(platform, nullptr, server.base());
     busy->show();
     server.stall("/programs/update.txt");

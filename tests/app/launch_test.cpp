@@ -71,7 +71,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
         "emu/z26", "#!/bin/sh\nprintf '%s\\n' \"$@\" > \"$0.tmp\" && mv \"$0.tmp\" \"$0.txt\"\n");
     ASSERT_TRUE(QFile::setPermissions(z26, QFile::permissions(z26) | QFile::ExeOwner));
     QtShell os;
-    Platform real{fake.store, fake.dialogs, os, fake.programFolder(), fake.network, fake.registry};
+    Platform real = fake.with(os);
     window = std::make_unique<frmMain>(real);
     const QPoint at = list()->visualRect(load().listModel().index(0, 0)).center();
     QTest::mouseClick(list()->viewport(), Qt::LeftButton, {}, at);

@@ -79,8 +79,10 @@ public:
         QString workingFolder;
     };
     bool StartProgram(const QString& program, const QStringList& arguments,
-                      const QString& workingFolder) override {
+                      const QString& workingFolder, QString* whyNot) override {
         started.push_back({program, arguments, workingFolder});
+        if (!succeed && whyNot)
+            *whyNot = QStringLiteral("Permission denied");
         return succeed;
     }
     bool OpenUrl(const QString& url) override { return record(urls, url); }
@@ -130,6 +132,29 @@ public:
     QString writeFile(const QString& relativePath, const QByteArray& content = {}) const;
     // Makes a folder under the temporary folder; returns its path.
     QString makeFolder(const QString& relativePath) const;
+    // The same platform with a real shell or another downloader in it.
+    Platform with(Shell& other) {
+        return {store,
+                dialogs,
+                other,
+                platform.programFolder,
+                network,
+                registry,
+                platform.userFolder,
+                platform.cacheFolder,
+                platform.dataFolder};
+    }
+    Platform with(Downloader& other) {
+        return {store,
+                dialogs,
+                shell,
+                platform.programFolder,
+                other,
+                registry,
+                platform.userFolder,
+                platform.cacheFolder,
+                platform.dataFolder};
+    }
     // A fresh store read back from the INI file, as the next start would see it.
     std::unique_ptr<IniSettingsStore> reopenStore() const;
 
