@@ -208,8 +208,11 @@ void frmMain::Form_Load() {
     assignMenuIcons();
     mcrc32 = std::make_unique<CCRC32>(m_platform.dialogs);
 
-    const QString defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
-    if (FileExist(defaultFile)) {
+    // The user's own start options first; the set that ships beside the program else.
+    QString defaultFile = m_platform.userFolder + QStringLiteral("/Default.lum");
+    if (!QFileInfo(defaultFile).isFile())
+        defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
+    if (QFileInfo(defaultFile).isFile()) {
         // A sound option set waits for the settings window; a corrupt one is reported now.
         const OptionSetRead optionSet =
             readOptionFile(defaultFile, m_settings ? m_settings->options() : EmulatorOptions());
@@ -224,7 +227,7 @@ void frmMain::Form_Load() {
                           QString());
     } else {
         showConfigCaption(QStringLiteral("Default.lum couldn't be loaded"),
-                          QStringLiteral("Default.lum need's to be in the same folder as lum.exe"));
+                          QStringLiteral("Default.lum need's to be in the same folder as lum"));
     }
 
     const SettingsStore& store = m_platform.store;
@@ -241,7 +244,13 @@ void frmMain::Form_Load() {
     vbalListViewCtl1->setForeColor(read(store, stored::textColor));
     ApplyBackground();
 
-    const QString z26Path = read(store, stored::z26Path);
+    QString z26Path = read(store, stored::z26Path);
+    if (z26Path.isEmpty()) {
+        // A z26 installed the usual way needs no first-run question.
+        z26Path = findProgramOnPath(z26FileName());
+        if (!z26Path.isEmpty())
+            write(m_platform.store, stored::z26Path, z26Path);
+    }
     const bool bRomPath = !readRomFolders(store).empty();
 
     if (!z26Path.isEmpty() && bRomPath) {

@@ -119,6 +119,10 @@ private:
     void mnuAboutlumAbout_Click();
     // Opens one of the emulator's documents in the text editor, or says it could not.
     void showEmulatorDocument(const QString& fileName);
+    // The folder z26 runs in.
+    QString emulatorWorkingFolder(const QString& emulator) const;
+    // Says that z26 at `emulator` could not be started, and why.
+    void launchFailed(const QString& emulator, const QString& reason);
     // The software ID of a ROM file in the game database beside the program, or 0.
     qint16 LookupSoftwareID(const QString& path);
     // The selected row's full path, or the empty text when no row is selected.

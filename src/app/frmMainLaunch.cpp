@@ -15,6 +15,7 @@
 #include "ui/ListView.h"
 
 #include <QCoreApplication>
+#include <QDir>
 #include <QFileInfo>
 
 void frmMain::LoadROM(bool ForceLoad) {
@@ -29,15 +30,14 @@ void frmMain::LoadROM(bool ForceLoad) {
         return;
     }
 
-    // From here on anything unexpected (no row selected, an emulator that cannot be
-    // started) ends the launch quietly.
-    const QString emulator = GetShortPath(completeZ26Path(z26Path));
-    if (emulator.isEmpty() || !QFileInfo(emulator).isFile())
-        return;
-
     const int row = vbalListViewCtl1->selectedRow();
     if (row < 0)
         return;
+    const QString emulator = GetShortPath(completeZ26Path(z26Path));
+    if (emulator.isEmpty() || !QFileInfo(emulator).isFile()) {
+        launchFailed(completeZ26Path(z26Path), QStringLiteral("There is no program file there."));
+        return;
+    }
     const QString romPath = GetShortPath(m_listModel->rowPath(row));
     if (!FileExist(romPath)) {
         m_platform.dialogs.MsgBox(
@@ -67,10 +67,32 @@ void frmMain::LoadROM(bool ForceLoad) {
 
     if (ForceLoad || !settings.switchEditing()) {
         // Never through a shell: the ROM's path is one argument whatever it holds.
-        m_platform.shell.StartProgram(emulator, switches::emulatorArguments(romPath, switchText));
+        QString whyNot;
+        if (!m_platform.shell.StartProgram(emulator,
+                                           switches::emulatorArguments(romPath, switchText),
+                                           emulatorWorkingFolder(emulator), &whyNot))
+            launchFailed(emulator, whyNot);
         return;
     }
 
     // "Edit Switches": the user reviews the switches and starts the game with Enter.
     settings.editSwitches();
+}
+
+QString frmMain::emulatorWorkingFolder(const QString& emulator) const {
+    // z26 writes its log and screenshots where it runs: beside itself when it may, in the
+    // user's data folder when it was installed read-only.
+    const QString own = QFileInfo(emulator).absolutePath();
+    if (QFileInfo(own).isWritable())
+        return own;
+    QDir().mkpath(m_platform.dataFolder);
+    return m_platform.dataFolder;
+}
+
+void frmMain::launchFailed(const QString& emulator, const QString& reason) {
+    m_platform.dialogs.MsgBox(this,
+                              QStringLiteral("z26 could not be started:\n\n") +
+                                  QDir::toNativeSeparators(emulator) + QStringLiteral("\n\n") +
+                                  reason,
+                              MsgButtons::Ok, MsgIcon::Critical, QStringLiteral("Launch Failed"));
 }

@@ -2,6 +2,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QStandardPaths>
 
 bool FileExist(const QString& path) {
     if (path.isEmpty())
@@ -27,4 +28,9 @@ QString GetShortPath(const QString& path) {
     if (!info.exists())
         return QString();
     return QDir::cleanPath(info.absoluteFilePath());
+}
+
+QString findProgramOnPath(const QString& name) {
+    const QString found = QStandardPaths::findExecutable(name);
+    return found.isEmpty() ? found : QDir::cleanPath(QFileInfo(found).absoluteFilePath());
 }

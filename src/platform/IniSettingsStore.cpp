@@ -74,15 +74,32 @@ IniSettingsStore::IniSettingsStore(QString filePath) : m_filePath(std::move(file
     // write, and anything but a regular file (a pipe would block the start). Each is kept
     // for the user to look at, not replaced.
     constexpr qint64 maxSize = 16 * 1024 * 1024;
+    if (!info.isFile()) {
+        m_unreadReason = QStringLiteral("That is not a regular file, so lum did not read it.");
+        return;
+    }
+    if (info.size() > maxSize) {
+        m_unreadReason = QStringLiteral("That file is larger than 16 MiB, far more than lum "
+                                        "ever writes, so lum did not read it.");
+        return;
+    }
     QFile file(m_filePath);
-    if (info.isFile() && info.size() <= maxSize && file.open(QIODevice::ReadOnly)) {
+    if (file.open(QIODevice::ReadOnly)) {
         const QByteArray text = file.readAll();
         if (file.error() == QFileDevice::NoError) {
             m_sections = parse(text);
             return;
         }
     }
-    m_fileUnread = true;
+    m_unreadReason = QStringLiteral("That file could not be read (") + file.errorString() +
+                     QStringLiteral("), so lum did not read it.");
+}
+
+QString IniSettingsStore::failureReason() const {
+    if (m_unreadReason.isEmpty() || !QFileInfo::exists(m_filePath))
+        return {};
+    return m_unreadReason +
+           QStringLiteral(" It is kept as it is: move it aside to start with fresh settings.");
 }
 
 QString IniSettingsStore::defaultFilePath() {
@@ -201,7 +218,7 @@ bool IniSettingsStore::DeleteSetting(const QString& section, const QString& key)
 
 bool IniSettingsStore::write() const {
     // Writing would put this session's few values in place of everything the file holds.
-    if (m_fileUnread && QFileInfo::exists(m_filePath))
+    if (!m_unreadReason.isEmpty() && QFileInfo::exists(m_filePath))
         return false;
     QDir().mkpath(QFileInfo(m_filePath).absolutePath());
     QSaveFile file(m_filePath);

@@ -22,6 +22,7 @@ public:
                        const QString& def = QString()) const override;
     bool SaveSetting(const QString& section, const QString& key, const QString& value) override;
     bool DeleteSetting(const QString& section, const QString& key) override;
+    QString failureReason() const override;
 
     const QString& filePath() const { return m_filePath; }
 
@@ -44,6 +45,6 @@ private:
 
     QString m_filePath;
     std::vector<Section> m_sections;
-    // The file existed at start but its settings could not be read.
-    bool m_fileUnread = false;
+    // The file existed at start but its settings could not be read: why, or empty.
+    QString m_unreadReason;
 };

@@ -30,12 +30,15 @@ bool ReportingSettingsStore::reportFailure(bool written) {
     // One box for a run of failures: closing the program alone writes several values.
     if (!m_reported) {
         m_reported = true;
+        QString why = m_store.failureReason();
+        if (why.isEmpty())
+            why = QStringLiteral("Check that the folder can be written to and that the disk is "
+                                 "not full.");
         m_dialogs.MsgBox(nullptr,
                          QStringLiteral("lum could not save its settings to\r\n") + m_location +
-                             QStringLiteral("\r\n\r\nCheck that the folder can be written to and "
-                                            "that the disk is not full. Your changes are kept "
-                                            "until lum ends and saved with the next change "
-                                            "that can be written."),
+                             QStringLiteral("\r\n\r\n") + why +
+                             QStringLiteral(" Your changes are kept until lum ends and saved "
+                                            "with the next change that can be written."),
                          MsgButtons::Ok, MsgIcon::Exclamation, QStringLiteral("lum"));
     }
     return false;

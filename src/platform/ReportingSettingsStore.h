@@ -16,6 +16,7 @@ public:
                        const QString& def = QString()) const override;
     bool SaveSetting(const QString& section, const QString& key, const QString& value) override;
     bool DeleteSetting(const QString& section, const QString& key) override;
+    QString failureReason() const override { return m_store.failureReason(); }
 
 private:
     bool reportFailure(bool written);

@@ -17,6 +17,8 @@ public:
     // Stores the value; false when it could not be written to disk.
     virtual bool SaveSetting(const QString& section, const QString& key, const QString& value) = 0;
     virtual bool DeleteSetting(const QString& section, const QString& key) = 0;
+    // Why writes fail when the store knows better than "the disk": empty otherwise.
+    virtual QString failureReason() const { return {}; }
 };
 
 // Stored texts as typed values: text that does not convert gives `def`. (The keys and their

@@ -29,7 +29,10 @@ bool read(const SettingsStore& store, const BoolSetting& setting) {
 }
 
 quint32 read(const SettingsStore& store, const ColourSetting& setting) {
-    return parseColour(get(store, setting.section, setting.key), setting.fallback);
+    // The program stores only plain colours; a system colour here came from elsewhere and
+    // may match the list's background.
+    const quint32 colour = parseColour(get(store, setting.section, setting.key), setting.fallback);
+    return colour <= 0xFFFFFF ? colour : setting.fallback;
 }
 
 WindowPlace read(const SettingsStore& store, const PlaceSetting& setting) {

@@ -22,7 +22,7 @@ struct BoolSetting {
     const char* key;
     bool fallback;
 };
-// An OLE colour number (0x00BBGGRR, or a system colour with the top bit set).
+// An OLE colour number (0x00BBGGRR); anything else stored reads as the fallback.
 struct ColourSetting {
     const char* section;
     const char* key;

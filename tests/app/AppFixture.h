@@ -61,7 +61,8 @@ protected:
     QString happened() {
         QStringList seen, windows;
         for (const FakeShell::Start& start : fake.shell.started)
-            seen << (QStringList{start.program} + start.arguments).join(' ') + start.workingFolder;
+            seen << (QStringList{start.program} + start.arguments).join(' ') + " in " +
+                        start.workingFolder;
         for (const QString& opened : fake.shell.textFiles + fake.shell.urls)
             seen << "open " + opened;
         for (const FakeDialogs::Box& box : fake.dialogs.boxes)

@@ -2,7 +2,8 @@
 
 #include "platform/QtShell.h"
 
-// A path leading nowhere is said; no program there, no selection, a failed start are not.
+// A path leading nowhere is said, and so is a z26 that cannot start; no selection is not. z26
+// runs in its own folder.
 TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     const QString name = "River Raid (it's \"good\") $HOME.bin"; // one argument, as it is
     storePaths({name, "Space Invaders.bin"});
@@ -11,11 +12,13 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     EXPECT_EQ(happened(), "");
     list()->setCurrentIndex(window->listModel().index(1, 0));
     const QString run = "~/emu/z26 ~/roms/Space Invaders.bin";
+    const QString failed = "\nLaunch Failed | z26 could not be started:\n\n~/";
     const std::pair<const char*, QString> paths[] = {
         {"", "Invalid z26 Path | z26 path isn't valid.\n\nTry removing the z26 path and "
              "re-adding it to correct the problem. | Ok | Exclamation"},
-        {"/named", ""}, // a folder whose z26 is a folder
-        {"/emu", run + " -p8 -M1"}};
+        {"/named", failed.mid(1) + "named/z26\n\nThere is no program file there. | Ok | Critical"},
+        {"/emu",
+         run + " -p8 -M1 in ~/emu" + failed + "emu/z26\n\nPermission denied | Ok | Critical"}};
     for (const auto& [path, outcome] : paths) {
         set("Z26Path", *path ? fake.root() + path : "");
         fake.shell.succeed = false;
@@ -40,7 +43,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
         {Cancel, "0", noControllers},
         {Yes, "0",
          question + "\npage PaddlesAudio\ntip txtLowerSens 3 | Zero Value | Number Cannot Be Zero"},
-        {Yes, "2", run + " -)NC -(NC -P2 -M1\n" + question}};
+        {Yes, "2", run + " -)NC -(NC -P2 -M1 in ~/emu\n" + question}};
     for (const auto& [answer, sensitivity, outcome] : answers) {
         o.lowerSensitivityBy = sensitivity;
         settings().setOptions(o);
@@ -59,7 +62,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     EXPECT_EQ(settings().focusWidget(), edit);
     edit->setText("  -c2  -v13");
     QTest::keyClick(edit, Qt::Key_Enter);
-    EXPECT_EQ(happened(), run + " -c2 -v13\n" + question + "\npage Debug");
+    EXPECT_EQ(happened(), run + " -c2 -v13 in ~/emu\n" + question + "\npage Debug");
     ASSERT_TRUE(QFile::remove(fake.root() + "/roms/Space Invaders.bin"));
     QTest::keyClick(edit, Qt::Key_Return);
     EXPECT_EQ(happened(),
@@ -69,12 +72,14 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     // The whole way, by a real shell; written aside first, never read half written.
     const QString z26 = fake.writeFile(
         "emu/z26", "#!/bin/sh\nprintf '%s\\n' \"$@\" > \"$0.tmp\" && mv \"$0.tmp\" \"$0.txt\"\n");
-    ASSERT_TRUE(QFile::setPermissions(z26, QFile::permissions(z26) | QFile::ExeOwner));
     QtShell os;
     Platform real = fake.with(os);
     window = std::make_unique<frmMain>(real);
     const QPoint at = list()->visualRect(load().listModel().index(0, 0)).center();
     QTest::mouseClick(list()->viewport(), Qt::LeftButton, {}, at);
+    QTest::mouseDClick(list()->viewport(), Qt::LeftButton, {}, at); // not yet a program
+    EXPECT_TRUE(happened().contains(failed.mid(1) + "emu/z26\n\n")) << happened().toStdString();
+    ASSERT_TRUE(QFile::setPermissions(z26, QFile::permissions(z26) | QFile::ExeOwner));
     QTest::mouseDClick(list()->viewport(), Qt::LeftButton, {}, at);
     EXPECT_TRUE(QTest::qWaitFor([&] { return QFile::exists(z26 + ".txt"); }, 10000)); // it ran
     EXPECT_EQ(fileBytes(z26 + ".txt"), (fake.root() + "/roms/" + name + "\n-p8\n-M1\n").toUtf8());

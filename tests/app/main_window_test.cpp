@@ -7,24 +7,33 @@
 // start wait for the settings window, built when first needed.
 TEST_F(MainWindow, StartsFromTheStoredPathsAndDefaultLum) {
     storePaths({"a.bin", "b.bin"});
-    // Folders of the emulator and the ROMs, Default.lum (at first none), the outcome.
-    const std::tuple<const char*, const char*, QByteArray, const char*> starts[] = {
-        {"", "roms", QByteArray(),
+    // Folders of the emulator and the ROMs, Default.lum (at first none) and its folder, the
+    // outcome; the user's Default.lum before the program's.
+    const std::tuple<const char*, const char*, QByteArray, const char*, const char*> starts[] = {
+        {"", "roms", QByteArray(), "program",
          "lum 0\nChoose z26 Path | You need to select you z26 path before you continue. | Ok | "
          "None\npage DefaultPaths\nDefault.lum couldn't be loaded / Default.lum need's to be in "
-         "the same folder as lum.exe\ngame type 0"},
-        {"emu", "", encodeOptions(sampleOptions()).left(100),
+         "the same folder as lum\ngame type 0"},
+        {"emu", "", encodeOptions(sampleOptions()).left(100), "program",
          "lum 0\nlum | .lum file is corrupt\r\nPlease verify settings and re-save to correct "
          "this problem | Ok | None\nChoose ROM's Path | You need to select you ROM's path before "
          "you continue. | Ok | None\npage DefaultPaths\nDefault.lum is corrupt.  Please verify "
          "settings and re-save to correct the problem. / \ngame type 0"},
-        {"emu", "roms", encodeOptions(sampleOptions()),
+        {"emu", "roms", encodeOptions(sampleOptions()), "program",
+         "lum - 2 ROM's Found 2\n\nDefault.lum was succesfully loaded / \ngame type 13"},
+        {"", "roms", encodeOptions(sampleOptions()), "config/lum",
          "lum - 2 ROM's Found 2\n\nDefault.lum was succesfully loaded / \ngame type 13"}};
-    for (const auto& [z26, roms, lum, expected] : starts) {
+    // Last, a z26 on PATH is found when none is stored.
+    const QString onPath = fake.writeFile("bin/z26");
+    QFile::setPermissions(onPath, QFile::permissions(onPath) | QFile::ExeOwner);
+    const QByteArray path = qgetenv("PATH");
+    for (const auto& [z26, roms, lum, folder, expected] : starts) {
+        if (QString(folder) == "config/lum")
+            qputenv("PATH", QFile::encodeName(fake.root() + "/bin"));
         set("Z26Path", *z26 ? fake.root() + "/" + z26 : "");
         storeFolder(1, roms);
         if (!lum.isEmpty())
-            fake.writeFile("program/Default.lum", lum);
+            fake.writeFile(QString(folder) + "/Default.lum", lum);
         frmMain& w = reload();
         QString outcome = w.windowTitle() + ' ' + QString::number(w.listModel().columnCount()) +
                           '\n' + happened();
@@ -34,6 +43,8 @@ TEST_F(MainWindow, StartsFromTheStoredPathsAndDefaultLum) {
                    QString::number(settings().options().gameType);
         EXPECT_EQ(outcome, expected);
     }
+    qputenv("PATH", path);
+    EXPECT_EQ(stored("Z26Path"), onPath);
     emit control<QMenu>(*window, "mnuFile")->aboutToShow(); // the icons come with a menu
     expectGolden("frmMain", dumpWidgetTree(*window));
 }

@@ -30,22 +30,27 @@ TEST(SettingsStore, EveryShapeOfTheFileReadsWhatItCanAndLosesNothing) {
     // A line without "=" is no key, a section cut short no section.
     const QByteArray garbage(
         "\xff=\n[\n=x\n\x80\0\xc3(=\n[Settings]\nROMPath=/after\nROMPath\n[Sett", 53);
-    // Each shape: a file and its bytes, a twist, what ROMPath reads, whether a change is written.
-    const std::tuple<const char*, const char*, QByteArray, Twist, const char*, bool> cases[] = {
-        {"missing", nullptr, {}, None, "default", true},
-        {"empty", ini, {}, None, "default", true},
-        {"cut short in a value", ini, "[Settings]\nROMPath=/ro", None, "/ro", true},
-        {"garbage", ini, garbage, None, "/after", true},
-        {"over 16 MiB", ini, roms + QByteArray(17 << 20, '#'), None, "default", false},
-        {"unreadable", ini, roms, Unreadable, "default", false},
-        {"a folder", "config/lum/lum.ini/keep.txt", "mine", None, "default", false},
-        {"a FIFO", nullptr, {}, Fifo, "default", false},
-        {"a file where its folder belongs", "config/lum", "mine", None, "default", false},
-        {"in a read-only folder", ini, roms, ReadOnlyFolder, "/roms", false},
-        {"on a full disk", ini, roms, FullDisk, "/roms", false},
-    };
+    // Each shape: a file and its bytes, a twist, what ROMPath reads, whether a change is written
+    // and what the box blames.
+    const char* const disk = "disk is not full";
+    const std::tuple<const char*, const char*, QByteArray, Twist, const char*, bool, const char*>
+        cases[] = {
+            {"missing", nullptr, {}, None, "default", true, disk},
+            {"empty", ini, {}, None, "default", true, disk},
+            {"cut short in a value", ini, "[Settings]\nROMPath=/ro", None, "/ro", true, disk},
+            {"garbage", ini, garbage, None, "/after", true, disk},
+            {"over 16 MiB", ini, roms + QByteArray(17 << 20, '#'), None, "default", false,
+             "larger than 16 MiB"},
+            {"unreadable", ini, roms, Unreadable, "default", false, "could not be read ("},
+            {"a folder", "config/lum/lum.ini/keep.txt", "mine", None, "default", false,
+             "not a regular file"},
+            {"a FIFO", nullptr, {}, Fifo, "default", false, "not a regular file"},
+            {"a file where its folder belongs", "config/lum", "mine", None, "default", false, disk},
+            {"in a read-only folder", ini, roms, ReadOnlyFolder, "/roms", false, disk},
+            {"on a full disk", ini, roms, FullDisk, "/roms", false, disk},
+        };
     const QString odd = QStringLiteral("  C:\\roms = [x];#y\nsecond line\\n ");
-    for (const auto& [name, file, bytes, twist, read, writes] : cases) {
+    for (const auto& [name, file, bytes, twist, read, writes, blamed] : cases) {
         SCOPED_TRACE(name);
         FakePlatform fake;
         const QString config = fake.root() + "/config";
@@ -69,6 +74,8 @@ TEST(SettingsStore, EveryShapeOfTheFileReadsWhatItCanAndLosesNothing) {
                                         store.DeleteSetting("settings", "ROMPATH")};
         EXPECT_EQ(done, std::vector<bool>(4, writes));
         EXPECT_TRUE(writes || tree(config) == before);
+        EXPECT_TRUE(writes || fake.dialogs.boxes.at(0).text.contains(blamed))
+            << fake.dialogs.boxes.at(0).text.toStdString();
         full.reset();
         ::chmod(QFile::encodeName(config + "/lum"), 0700);
         ASSERT_TRUE(writes || QDir(config).removeRecursively());
@@ -110,7 +117,7 @@ TEST(StoredSettings, EachKeyHasItsSectionNameAndDefault) {
         "width=11115\n";
     EXPECT_EQ(resaved({}), "\n" + defaults);
     const QByteArray damaged =
-        "[Settings]\nZ26Path=\nROMFilter=*.bin\nBackColor=4294967296\nTextColor=1234.5\nBackImg=\n"
+        "[Settings]\nZ26Path=\nROMFilter=*.bin\nBackColor=2147483663\nTextColor=1234.5\nBackImg=\n"
         "BackImgEnabled=Tru\nROMPath=\n\n[winpos]\nmax=tall\ntop=nan\nleft=1e400\nheight=3.5e38\n"
         "width=12abc\n\n[setpos]\ntop=inf\nleft= 7 \n\n[picpos]\ntop=\nleft=-\nheight=1e\n"
         "width=5 5\n";
