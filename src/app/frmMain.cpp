@@ -18,6 +18,7 @@
 #include "ui/ListView.h"
 #include "ui/OleColor.h"
 #include "ui/PictureFile.h"
+#include "ui/ScreenPlace.h"
 #include "ui/Twips.h"
 #include "ui/cTextBoxXP.h"
 #include "ui/vbalProgressBar.h"
@@ -75,6 +76,7 @@ void frmMain::createControls() {
     txtSearch->installEventFilter(this);
     connect(vbalListViewCtl1, &ListView::keyDown, this, &frmMain::vbalListViewCtl1_KeyDown);
     connect(vbalListViewCtl1, &ListView::mouseDown, this, &frmMain::vbalListViewCtl1_MouseDown);
+    connect(vbalListViewCtl1, &ListView::popupKey, this, &frmMain::showRowPopup);
     connect(vbalListViewCtl1, &ListView::itemDoubleClicked, this, [this] { LoadROM(false); });
 
     picBack = new QLabel(central);
@@ -232,8 +234,8 @@ void frmMain::Form_Load() {
 
     const SettingsStore& store = m_platform.store;
     const WindowPlace place = read(store, stored::mainWindow);
-    resize(twips::toPixelsX(place.width), twips::toPixelsY(place.height));
-    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
+    m_place = placeOnScreen(*this, {twips::toPixelsX(place.left), twips::toPixelsY(place.top),
+                                    twips::toPixelsX(place.width), twips::toPixelsY(place.height)});
     if (read(store, stored::mainWindowMaximized))
         setWindowState(windowState() | Qt::WindowMaximized);
 
@@ -278,14 +280,16 @@ void frmMain::Form_Load() {
 }
 
 void frmMain::addListColumns() {
-    const int listWidth = vbalListViewCtl1->width();
     m_listModel->addColumn(
         {QStringLiteral("Name"), QStringLiteral("Name"), QStringLiteral("ROM Name")});
     m_listModel->addColumn(
         {QStringLiteral("Path"), QStringLiteral("Path"), QStringLiteral("ROM Path")});
+    // The name takes what the folder leaves, at any width of the window; a long folder
+    // keeps both its ends.
     QHeaderView* header = vbalListViewCtl1->header();
-    header->resizeSection(0, listWidth + twips::toPixelsX(1000));
+    header->setSectionResizeMode(0, QHeaderView::Stretch);
     header->resizeSection(1, twips::toPixelsX(1000));
+    vbalListViewCtl1->setColumnElideMode(1, Qt::ElideMiddle);
 }
 
 void frmMain::RefreshMainList() {
@@ -353,9 +357,10 @@ void frmMain::Form_Resize() {
         return; // the resize comes back here with the corrected size
     }
     const double w = twips::fromPixelsX(width());
-    const double h = twips::fromPixelsY(height());
-    const double frameWidth = w - 330;
-    const double frameHeight = h - 1755;
+    // Margins of 120 all round: Qt's sizes leave out the title bar and borders that the
+    // Windows sizes these come from included.
+    const double frameWidth = w - 240;
+    const double frameHeight = twips::fromPixelsY(centralWidget()->height()) - 1020;
     fraSelectRom->setGeometry(twips::toPixelsX(120), twips::toPixelsY(120),
                               twips::toPixelsX(frameWidth), twips::toPixelsY(frameHeight));
     vbalListViewCtl1->setGeometry(twips::toPixelsX(120), twips::toPixelsY(240),
@@ -377,7 +382,7 @@ void frmMain::Form_Unload() {
     SettingsStore& store = m_platform.store;
     if (!isMinimized()) {
         write(store, stored::mainWindowMaximized, isMaximized());
-        if (!isMaximized())
+        if (!isMaximized() && placeChangedByUser(*this, m_place))
             write(store, stored::mainWindow,
                   {twips::fromPixelsY(y()), twips::fromPixelsX(x()), twips::fromPixelsX(width()),
                    twips::fromPixelsY(height())});
@@ -465,8 +470,11 @@ void frmMain::vbalListViewCtl1_KeyDown(int key) {
 }
 
 void frmMain::vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos) {
-    if (button != Qt::RightButton)
-        return;
+    if (button == Qt::RightButton)
+        showRowPopup(globalPos);
+}
+
+void frmMain::showRowPopup(QPoint globalPos) {
     mnuMainGameInfo->setVisible(false);
     if (const QString path = selectedRowPath(); !path.isEmpty() && LookupSoftwareID(path) != 0)
         mnuMainGameInfo->setVisible(true);
@@ -601,7 +609,14 @@ void frmMain::mnuAboutlumHomePage_Click() {
 }
 
 void frmMain::mnuAboutlumAbout_Click() {
+    if (m_about) {
+        m_about->show();
+        m_about->raise();
+        m_about->activateWindow();
+        return;
+    }
     auto* about = new frmAbout(m_platform, this);
+    m_about = about;
     // The update check may start an installer and end the program at once, without any
     // window saving its state.
     connect(about, &frmAbout::endProgramRequested, qApp, [] { QCoreApplication::exit(0); });

@@ -2,9 +2,11 @@
 
 #include "emulator/EmulatorOptions.h"
 #include "library/RomCatalogue.h"
+#include "ui/ScreenPlace.h"
 
 #include <QImage>
 #include <QMainWindow>
+#include <QPointer>
 
 #include <memory>
 #include <optional>
@@ -12,6 +14,7 @@
 #include <vector>
 
 struct Platform;
+class frmAbout;
 class frmSettings;
 class ListView;
 class QAction;
@@ -90,6 +93,8 @@ private:
     void txtSearch_DblClick();
     void vbalListViewCtl1_KeyDown(int key);
     void vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos);
+    // The row popup at a place on the screen, with Game Info when the row is known.
+    void showRowPopup(QPoint globalPos);
 
     void createControls();
     void createMenus();
@@ -137,5 +142,7 @@ private:
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;
+    ScreenFit m_place;          // as opened: a corrected place is not saved unless changed
+    QPointer<frmAbout> m_about; // one at a time
     RomListModel* m_listModel = nullptr;
 };

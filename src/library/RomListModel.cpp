@@ -24,11 +24,12 @@ int RomListModel::columnCount(const QModelIndex& parent) const {
 }
 
 QVariant RomListModel::data(const QModelIndex& index, int role) const {
-    if (!index.isValid() || index.row() >= rowCount() || role != Qt::DisplayRole)
+    if (!index.isValid() || index.row() >= rowCount())
         return QVariant();
-    if (index.column() == 0)
+    if (index.column() == 0 && role == Qt::DisplayRole)
         return m_names.at(index.row()).toString();
-    if (index.column() == 1)
+    // The folder's whole path also as a tip: the column shows it cut in the middle.
+    if (index.column() == 1 && (role == Qt::DisplayRole || role == Qt::ToolTipRole))
         return QDir::toNativeSeparators(m_folders[m_rowFolders[static_cast<size_t>(index.row())]]);
     return QVariant();
 }

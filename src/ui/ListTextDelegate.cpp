@@ -32,6 +32,13 @@ QTextLine layOut(QTextLayout& layout, int width) {
 
 ListTextDelegate::~ListTextDelegate() = default;
 
+void ListTextDelegate::initStyleOption(QStyleOptionViewItem* option,
+                                       const QModelIndex& index) const {
+    QStyledItemDelegate::initStyleOption(option, index);
+    if (const auto mode = m_elide.constFind(index.column()); mode != m_elide.cend())
+        option->textElideMode = *mode;
+}
+
 const ListTextDelegate::Line& ListTextDelegate::laidOut(int column, const QString& text,
                                                         const QStyleOptionViewItem& opt,
                                                         int width) const {

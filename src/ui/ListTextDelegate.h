@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QHash>
 #include <QStyledItemDelegate>
 #include <QTextLayout>
 
@@ -19,8 +20,14 @@ public:
 
     void paint(QPainter* painter, const QStyleOptionViewItem& option,
                const QModelIndex& index) const override;
+    // Where a column's text is cut when it does not fit (the view's mode otherwise).
+    void setElideMode(int column, Qt::TextElideMode mode) { m_elide[column] = mode; }
+
+protected:
+    void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
 
 private:
+    QHash<int, Qt::TextElideMode> m_elide;
     // The last text laid out in each column: a folder column shows one text all the way
     // down the list, so it is shaped and cut to width once.
     struct Line {

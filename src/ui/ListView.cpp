@@ -4,6 +4,7 @@
 #include "ui/OleColor.h"
 #include "ui/PictureFile.h"
 
+#include <QContextMenuEvent>
 #include <QHeaderView>
 #include <QKeyEvent>
 #include <QMouseEvent>
@@ -64,7 +65,16 @@ int ListView::selectedRow() const {
     return index.row();
 }
 
+void ListView::setColumnElideMode(int column, Qt::TextElideMode mode) {
+    static_cast<ListTextDelegate*>(itemDelegate())->setElideMode(column, mode);
+}
+
 void ListView::keyPressEvent(QKeyEvent* event) {
+    if (event->key() == Qt::Key_Menu ||
+        (event->key() == Qt::Key_F10 && event->modifiers() == Qt::ShiftModifier)) {
+        requestPopupAtCurrentRow();
+        return;
+    }
     emit keyDown(event->key());
     if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter ||
         event->key() == Qt::Key_F5)
@@ -75,4 +85,16 @@ void ListView::keyPressEvent(QKeyEvent* event) {
 void ListView::mousePressEvent(QMouseEvent* event) {
     QTreeView::mousePressEvent(event);
     emit mouseDown(event->button(), event->globalPosition().toPoint());
+}
+
+void ListView::contextMenuEvent(QContextMenuEvent* event) {
+    // The mouse's popup comes with its button press; this is the keyboard's.
+    if (event->reason() == QContextMenuEvent::Keyboard)
+        requestPopupAtCurrentRow();
+}
+
+void ListView::requestPopupAtCurrentRow() {
+    const QRect row = visualRect(currentIndex());
+    const QPoint at = row.isValid() ? row.bottomLeft() : QPoint(0, 0);
+    emit popupKey(viewport()->mapToGlobal(at));
 }

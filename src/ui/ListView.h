@@ -22,17 +22,24 @@ public:
 
     // The 0-based row of the current item, or -1 when no row is selected.
     int selectedRow() const;
+    // Where a column's text is cut when it does not fit.
+    void setColumnElideMode(int column, Qt::TextElideMode mode);
 
 signals:
     void itemDoubleClicked(int row);
     void keyDown(int key);
     void mouseDown(Qt::MouseButton button, QPoint globalPos);
+    // The Menu key or Shift+F10: a popup for the current row, at that row.
+    void popupKey(QPoint globalPos);
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
 
 private:
+    void requestPopupAtCurrentRow();
+
     void applyPalette();
 
     quint32 m_backColor = 0xFFFFFF;

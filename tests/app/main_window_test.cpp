@@ -66,7 +66,13 @@ TEST_F(MainWindow, KeepsItsPlaceAndItsMenusReachDocumentsPagesOptionSetsAndWindo
     w.resize(320, 530);
     const auto* search = control<QLineEdit>(w, "txtSearch");
     EXPECT_EQ(control<vbalProgressBar>(w, "vbalProgressBar1")->geometry(), search->geometry());
-    EXPECT_EQ(control<QGroupBox>(w, "fraSelectRom")->width(), 320 - 22);
+    const QHeaderView* header = list()->header(); // the name takes what the path leaves
+    EXPECT_EQ(header->sectionSize(0) + header->sectionSize(1), list()->viewport()->width());
+    const auto* frame = control<QGroupBox>(w, "fraSearch"); // margins of 8 pixels, no band
+    const QRect inside = frame->parentWidget()->rect();
+    EXPECT_EQ(QPoint(inside.right() - frame->geometry().right(),
+                     inside.bottom() - frame->geometry().bottom()),
+              QPoint(8, 8));
 
     const auto closed = [this] {
         window->close();
@@ -102,7 +108,8 @@ TEST_F(MainWindow, KeepsItsPlaceAndItsMenusReachDocumentsPagesOptionSetsAndWindo
     EXPECT_EQ(happened(),
               "open ~/emu/copying.txt\nError | Error loading COPYING.TXT | Ok | Exclamation");
     for (const char* item : {"mnuAboutz26HomePage", "mnuAboutlumHomePage", "mnuFileSaveSettings",
-                             "mnuFileLoadSettings", "mnuSettingsConfiguration", "mnuAboutlumAbout"})
+                             "mnuFileLoadSettings", "mnuSettingsConfiguration", "mnuAboutlumAbout",
+                             "mnuAboutlumAbout"}) // one About window, brought to the front
         action(item)->trigger();
     const QStringList seen = happened().split('\n');
     EXPECT_TRUE(seen.size() == 4 && seen[0] != seen[1] && seen.filter("open https://").size() == 2)

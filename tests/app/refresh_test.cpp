@@ -37,17 +37,26 @@ TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
     load();
     seen << listing();
 
-    const auto rightClick = [this](int row) { // what the popup menu offers
+    // What the popup menu offers, opened by a right click on a row or a key on the current one.
+    const auto rightClick = [this](int row, Qt::Key key = {}, Qt::KeyboardModifier with = {}) {
         const QRect r = list()->visualRect(window->listModel().index(row, 0));
-        QTest::mouseClick(list()->viewport(), Qt::RightButton, {}, r.center());
+        if (key) {
+            list()->setCurrentIndex(window->listModel().index(row, 0));
+            QTest::keyClick(list(), key, with);
+        } else {
+            QTest::mouseClick(list()->viewport(), Qt::RightButton, {}, r.center());
+        }
         auto* popup = control<QMenu>(*window, "mnuMainPopup");
-        QString offers = popup->isVisible() ? "menu" : "no menu";
+        const QPoint at = list()->viewport()->mapFromGlobal(popup->pos());
+        QString offers = !popup->isVisible() ? "no menu" : r.contains(at) || !key ? "menu" : "away";
         for (const char* item : {"mnuMainRefresh", "mnuMainGameInfo"})
             offers += action(item)->isVisible() ? ' ' + QString(item).mid(7) : "";
         popup->hide();
         return offers;
     };
     EXPECT_EQ(rightClick(2), "menu Refresh");
+    EXPECT_EQ(rightClick(3, Qt::Key_Menu) + ", " + rightClick(3, Qt::Key_F10, Qt::ShiftModifier),
+              "menu Refresh GameInfo, menu Refresh GameInfo");
     EXPECT_EQ(rightClick(3), "menu Refresh GameInfo"); // and stays selected for Game Info
     action("mnuMainGameInfo")->trigger();
     EXPECT_TRUE(happened().contains(

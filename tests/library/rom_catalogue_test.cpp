@@ -60,8 +60,9 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
         catalogue.prefetch({a}, "*.bin"); // for other folders: not taken
         EXPECT_EQ(refreshed(folders, pattern, search), expected);
     }
-    EXPECT_EQ(model.index(0, 0).data().toString() + " in " + model.index(0, 1).data().toString(),
-              "Game 1234.rom in " + root + "/many");
+    EXPECT_EQ(model.index(0, 0).data().toString() + " in " + model.index(0, 1).data().toString() +
+                  " tip " + model.index(0, 1).data(Qt::ToolTipRole).toString(),
+              "Game 1234.rom in " + root + "/many tip " + root + "/many");
     EXPECT_EQ(model.rowPath(-1) + model.rowPath(1), "");
 
     // A listing started ahead serves one refresh of the same folders and pattern at most.
