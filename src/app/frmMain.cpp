@@ -308,20 +308,19 @@ void frmMain::RefreshMainList() {
         QCoreApplication::processEvents();
     }
 
+    // The caption and the bar show before any folder is read.
+    if (!m_bInitialLoad)
+        fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
+    txtSearch->hide();
+    vbalProgressBar1->setMin(0);
+    vbalProgressBar1->setValue(0);
+    vbalProgressBar1->show();
     bool bListed = false;
     const auto progress = [&](qint64 done, qint64 total) {
         if (!bListed) {
             bListed = true;
-            if (!m_bInitialLoad) {
-                fraSearch->setTitle(QStringLiteral("Finding ROM's..."));
-                QCoreApplication::processEvents();
-            }
-            txtSearch->hide();
-            vbalProgressBar1->setMin(0);
             if (total > 0)
                 vbalProgressBar1->setMax(static_cast<int>(std::min<qint64>(total, INT_MAX)));
-            vbalProgressBar1->setValue(0);
-            vbalProgressBar1->show();
             m_listModel->clear();
         }
         const int value = static_cast<int>(std::min<qint64>(done, INT_MAX));
@@ -329,8 +328,10 @@ void frmMain::RefreshMainList() {
         vbalProgressBar1->setText(
             QString::number(std::llround(vbalProgressBar1->PercentAt(value))) + u'%');
     };
+    // Painted while the folders are read, but no key or click starts anything meanwhile.
+    const auto paint = [] { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); };
     RomRows rows = m_catalogue.refresh(enabledRomFolders(store), read(store, stored::romFilter),
-                                       search, progress);
+                                       search, progress, paint);
     const qint64 listed = rows.listed;
     m_listModel->setRows(std::move(rows.folders), std::move(rows.names),
                          std::move(rows.rowFolders));

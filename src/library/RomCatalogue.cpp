@@ -27,25 +27,20 @@ void RomCatalogue::dropPrefetch() {
         m_prefetch.get();
 }
 
-std::vector<RomCatalogue::Listing> RomCatalogue::takePrefetch(const QStringList& folders,
-                                                              const QString& pattern) {
-    if (!m_prefetch.valid())
-        return {};
-    std::vector<Listing> listings = m_prefetch.get();
-    // Folders or a pattern changed since it started: they are listed again.
-    if (folders != m_prefetchFolders || pattern != m_prefetchPattern)
-        return {};
-    return listings;
-}
-
 RomRows RomCatalogue::refresh(const QStringList& folders, const QString& pattern,
-                              const QString& search, const RefreshProgress& progress) {
-    std::vector<Listing> listings = takePrefetch(folders, pattern);
-    if (listings.empty()) {
-        const FilePattern filePattern(pattern);
-        for (const QString& folder : folders)
-            listings.push_back({folder, listMatchingFiles(folder, filePattern)});
+                              const QString& search, const RefreshProgress& progress,
+                              const std::function<void()>& whileListing) {
+    // Folders or a pattern changed since a listing started ahead: they are listed again.
+    if (!m_prefetch.valid() || folders != m_prefetchFolders || pattern != m_prefetchPattern)
+        prefetch(folders, pattern);
+    // A slow folder (a network share) is read on the other thread while the caller keeps
+    // its window painted.
+    if (whileListing) {
+        whileListing();
+        while (m_prefetch.wait_for(std::chrono::milliseconds(16)) != std::future_status::ready)
+            whileListing();
     }
+    std::vector<Listing> listings = m_prefetch.get();
     RomRows rows;
     for (const Listing& listing : listings)
         rows.listed += listing.names.size();

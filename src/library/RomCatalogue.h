@@ -38,18 +38,20 @@ public:
     void dropPrefetch();
 
     // Lists each folder once and keeps the names the search matches, all of them for an
-    // empty search. `progress` is called with done 0 once every folder is listed, then at
-    // least every thousandth of the names while a search is matched (without one, each
-    // folder is taken whole at once), and last with done equal to total.
+    // empty search. The folders are read on another thread; `whileListing`, when given, is
+    // called once before and then about every 16 ms until they are read. `progress` is
+    // called with done 0 once every folder is listed, then at least every thousandth of the
+    // names while a search is matched (without one, each folder is taken whole at once),
+    // and last with done equal to total.
     RomRows refresh(const QStringList& folders, const QString& pattern, const QString& search,
-                    const RefreshProgress& progress);
+                    const RefreshProgress& progress,
+                    const std::function<void()>& whileListing = {});
 
 private:
     struct Listing {
         QString folder;
         NameList names;
     };
-    std::vector<Listing> takePrefetch(const QStringList& folders, const QString& pattern);
 
     std::future<std::vector<Listing>> m_prefetch;
     QStringList m_prefetchFolders;

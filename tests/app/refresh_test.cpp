@@ -18,7 +18,8 @@ TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
     storeFolder(3, "third");
     storeFolder(4, "");
     storeFolder(5, "fifth", {"Late.bin"});
-    // Each time the bar shows: the caption, and whether it took the search box's place.
+    // Each time the bar shows: the caption, and whether it took the search box's place. A game
+    // added then is listed: the bar shows before any folder is read.
     struct : QObject {
         std::function<bool()> on; // false: the event goes on
         bool eventFilter(QObject*, QEvent* e) override { return e->type() == QEvent::Show && on(); }
@@ -30,6 +31,8 @@ TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
     watch.on = [&] {
         const bool bInstead = search->isHidden() && bar->geometry() == search->geometry();
         seen << caption() + (bInstead ? " instead" : " beside");
+        if (caption() == "Finding ROM's...")
+            fake.writeFile("roms/Asteroids (new).bin");
         return false;
     };
     bar->installEventFilter(&watch);
@@ -69,14 +72,15 @@ TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
     bar->removeEventFilter(&watch);
     EXPECT_EQ(seen.join('\n'),
               "Loading ROM's List... instead\nlum - 4 ROM's Found | Asteroids [PAL].bin, "
-              "Asteroids.bin, Pac-Man.bin, Known.bin\nFinding ROM's... instead\nlum - 1 Match "
-              "out of 4 | Asteroids.bin | Only show filenames containing... 4/4 100%");
+              "Asteroids.bin, Pac-Man.bin, Known.bin\nFinding ROM's... instead\nlum - 2 Matches "
+              "out of 5 | Asteroids (new).bin, Asteroids.bin | Only show filenames containing... "
+              "5/5 100%");
     EXPECT_TRUE(bar->isHidden() && window->focusWidget() == search);
     // F5 in the list applies the search box's text and the pattern as now stored.
     set("ROMFilter", "*.BIN;*.A26");
     search->setText("pac");
     QTest::keyClick(list(), Qt::Key_F5);
-    EXPECT_EQ(listing(), "lum - 2 Matches out of 5 | Pac-Man.bin, Pacific.a26");
+    EXPECT_EQ(listing(), "lum - 2 Matches out of 6 | Pac-Man.bin, Pacific.a26");
 
     search->setText("pacman");
     const std::tuple<char, int, const char*> keys[] = {
