@@ -209,6 +209,9 @@ void frmMain::assignMenuIconsNow() {
 void frmMain::Form_Load() {
     assignMenuIcons();
     mcrc32 = std::make_unique<CCRC32>(m_platform.dialogs);
+    // The window keeps painting while a ROM on a slow disk is identified.
+    connect(mcrc32.get(), &CCRC32::Progress, this,
+            [] { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); });
 
     // The user's own start options first; the set that ships beside the program else.
     QString defaultFile = m_platform.userFolder + QStringLiteral("/Default.lum");

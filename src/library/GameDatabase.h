@@ -31,7 +31,8 @@ struct GameRecord {
 
 // The software ID of the ROM image at romPath: the ID of the first record of the database
 // whose CRC equals the image's CRC-32, or 0 when none does. The database is only read: a
-// missing one identifies nothing and is not created. Nothing is kept between lookups.
+// missing one identifies nothing and is not created. Nothing is kept between lookups. A file
+// over 16 MiB is not read and identifies nothing.
 qint16 LookupSoftwareID(CCRC32& crc, const QString& databasePath, const QString& romPath);
 
 // The scan alone: the ID of the first record whose CRC is `key`, or 0.

@@ -5,6 +5,7 @@
 #include "support/Files.h"
 
 #include <QFileInfo>
+#include <QProcess>
 
 #include <sys/stat.h>
 
@@ -84,14 +85,22 @@ TEST(GameList, ReadsEntriesAndNamesABadLine) {
         }
 }
 
-// The database built beside the program from its list identifies our test cartridges.
-TEST(GameDatabase, TheBuiltDatabaseIdentifiesTheTestCartridges) {
+// The tool builds a database from a list that identifies our test cartridges; one over 16 MiB
+// is not read. The database that ships holds no invented entries.
+TEST(GameDatabase, TheToolsDatabaseIdentifiesTheTestCartridgesButNoHugeFile) {
     FakePlatform fake;
+    const QString list = fake.writeFile("CRCID.txt", "1, Rising, AE215F82\n2, Falling, 8145AE72\n"
+                                                     "3, Flashing, 555083D5\n4, Huge, 8F77090B\n");
+    const QString database = fake.root() + "/CRCID.dat";
+    ASSERT_EQ(QProcess::execute(LUM_CRCID_TOOL, {list, database}), 0);
+    QFile huge(fake.writeFile("huge.a26")); // 17 MiB of zeros, whose CRC is listed
+    ASSERT_TRUE(huge.resize(17 << 20));
     CCRC32 crc(fake.dialogs);
-    qint16 id = 32001;
+    QString ids;
     for (const QString rom : {"rising-bars", "falling-bars", "flashing-screen"})
-        EXPECT_EQ(
-            LookupSoftwareID(crc, LUM_CRCID_DAT, LUM_CRCID_SOURCE_DIR "/testroms/" + rom + ".a26"),
-            id++);
+        ids += QString::number(
+            LookupSoftwareID(crc, database, LUM_CRCID_SOURCE_DIR "/testroms/" + rom + ".a26"));
+    EXPECT_EQ(ids + QString::number(LookupSoftwareID(crc, database, huge.fileName())), "1230");
     EXPECT_TRUE(fake.dialogs.boxes.empty());
+    EXPECT_EQ(QFileInfo(LUM_CRCID_DAT).size(), 0);
 }
