@@ -2,6 +2,7 @@
 #include "library/ReadFully.h"
 
 #include "platform/Dialogs.h"
+#include "platform/FileSystem.h"
 
 #include <QFile>
 #include <QSysInfo>
@@ -234,7 +235,7 @@ void CCRC32::showError(const QString& operation, int number, const QString& desc
 
 qint32 CCRC32::GetCRCFromFile() {
     const QString operation = QStringLiteral("GetCRCFromFile");
-    const QByteArray path = QFile::encodeName(m_inputFileName);
+    const QByteArray path = nameToFileSystem(m_inputFileName);
     // Non-blocking so that a FIFO or a device named by mistake cannot hang the window;
     // anything that is not a regular file is refused below.
     int fd = -1;

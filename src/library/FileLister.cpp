@@ -1,6 +1,7 @@
 #include "library/FileLister.h"
 
 #include "library/Ascii.h"
+#include "platform/FileSystem.h"
 
 #include <QFile>
 
@@ -109,7 +110,7 @@ private:
 QString decodeName(std::string_view name) {
     const auto size = static_cast<qsizetype>(name.size());
     return isAscii(name) ? QString::fromLatin1(name.data(), size)
-                         : QFile::decodeName(QByteArray(name.data(), size));
+                         : nameFromFileSystem(QByteArrayView(name.data(), size));
 }
 
 struct SortEntry {

@@ -5,7 +5,6 @@
 #include "platform/FileSystem.h"
 
 #include <QFile>
-#include <QFileInfo>
 #include <QHash>
 #include <QStringDecoder>
 
@@ -102,7 +101,8 @@ qint16 findSoftwareID(const QString& databasePath, qint32 key) {
 qint16 LookupSoftwareID(CCRC32& crc, const QString& databasePath, const QString& romPath) {
     // No cartridge image comes near this size; reading a film by mistake would take long.
     constexpr qint64 kLargestRom = 16 * 1024 * 1024;
-    if (QFileInfo(romPath).size() > kLargestRom)
+    struct stat status {};
+    if (::stat(nameToFileSystem(romPath).constData(), &status) == 0 && status.st_size > kLargestRom)
         return 0;
     crc.setInputFileName(GetShortPath(romPath));
     const qint32 key = crc.GetCRCFromFile();

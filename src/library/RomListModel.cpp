@@ -1,5 +1,7 @@
 #include "library/RomListModel.h"
 
+#include "platform/FileSystem.h"
+
 #include <QDir>
 
 QModelIndex RomListModel::index(int row, int column, const QModelIndex& parent) const {
@@ -27,7 +29,7 @@ QVariant RomListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || index.row() >= rowCount())
         return QVariant();
     if (index.column() == 0 && role == Qt::DisplayRole)
-        return m_names.at(index.row()).toString();
+        return readableName(m_names.at(index.row()));
     // The folder's whole path also as a tip: the column shows it cut in the middle.
     if (index.column() == 1 && (role == Qt::DisplayRole || role == Qt::ToolTipRole))
         return QDir::toNativeSeparators(m_folders[m_rowFolders[static_cast<size_t>(index.row())]]);

@@ -2,7 +2,7 @@
 
 #include "platform/Shell.h"
 
-// Starts programs with QProcess::startDetached and opens documents and addresses with
+// Starts programs detached, their arguments byte for byte, and opens documents and addresses with
 // the desktop's default applications.
 class QtShell final : public Shell {
 public:

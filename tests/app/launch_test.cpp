@@ -2,11 +2,13 @@
 
 #include "platform/QtShell.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 // A path leading nowhere is said, and so is a z26 that cannot start; no selection is not. z26
 // runs in its own folder.
 TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
-    const QString name = "River Raid (it's \"good\") $HOME.bin"; // one argument, as it is
-    storePaths({name, "Space Invaders.bin"});
+    storePaths({"River Raid.bin", "Space Invaders.bin"});
     fake.makeFolder("named/z26");
     load().LoadROM(); // nothing selected yet
     EXPECT_EQ(happened(), "");
@@ -72,6 +74,10 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     // The whole way, by a real shell; written aside first, never read half written.
     const QString z26 = fake.writeFile(
         "emu/z26", "#!/bin/sh\nprintf '%s\\n' \"$@\" > \"$0.tmp\" && mv \"$0.tmp\" \"$0.txt\"\n");
+    // A name that is not UTF-8 (listed first) is shown readably and given to z26 as it is, as
+    // one argument whatever it holds.
+    const QByteArray name = "Caf\xE9 (it's \"good\") $HOME.bin";
+    ::close(::creat(QFile::encodeName(fake.root()) + "/roms/" + name, 0644));
     QtShell os;
     Platform real = fake.with(os);
     window = std::make_unique<frmMain>(real);
@@ -82,6 +88,7 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     ASSERT_TRUE(QFile::setPermissions(z26, QFile::permissions(z26) | QFile::ExeOwner));
     QTest::mouseDClick(list()->viewport(), Qt::LeftButton, {}, at);
     EXPECT_TRUE(QTest::qWaitFor([&] { return QFile::exists(z26 + ".txt"); }, 10000)); // it ran
-    EXPECT_EQ(fileBytes(z26 + ".txt"), (fake.root() + "/roms/" + name + "\n-p8\n-M1\n").toUtf8());
+    EXPECT_EQ(fileBytes(z26 + ".txt"), (fake.root() + "/roms/").toUtf8() + name + "\n-p8\n-M1\n");
+    EXPECT_EQ(window->listModel().index(0, 0).data(), "Café (it's \"good\") $HOME.bin");
     window.reset(); // before the shell and platform it uses, even when a check failed
 }

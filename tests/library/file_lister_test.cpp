@@ -65,7 +65,8 @@ TEST(FileLister, ListsReadableRegularFilesSortedAsOneList) {
     // A name that is not UTF-8, as on a file copied from an old Latin-1 disk.
     const QByteArray latin1 = QFile::encodeName(folder) + "/Pitfall\xe9.bin";
     ASSERT_EQ(::close(::creat(latin1.constData(), 0600)), 0);
-    expected << "link.bin" << QFile::decodeName("Pitfall\xe9.bin");
+    expected << "link.bin"
+             << "Pitfall" + QString(QChar(0xDCE9)) + ".bin"; // the byte kept
     std::ranges::sort(expected, {}, [](const QString& name) {
         return std::pair(name.toCaseFolded().toUtf8(), name.toUtf8());
     });

@@ -4,6 +4,25 @@
 
 #include <gtest/gtest.h>
 
+// A name's bytes come back whole from its text, valid UTF-8 or not; it reads as Latin-1 where
+// it is not UTF-8.
+TEST(FileSystem, EveryNameKeepsItsBytes) {
+    const std::pair<QByteArray, QString> cases[] = {
+        {"Pitfall!.bin", "Pitfall!.bin"},
+        {"Caf\xC3\xA9 \xE2\x82\xAC \xF0\x9F\x98\x80", "Café € 😀"},
+        {"Caf\xE9.bin", "Café.bin"},                                  // Latin-1
+        {"\xC3", "\u00C3"},                                           // cut short
+        {"\xC0\xAF \xE0\x80\xAF", "\u00C0\u00AF \u00E0\u0080\u00AF"}, // overlong
+        {"\xED\xA0\x80", "\u00ED\u00A0\u0080"},                       // a surrogate
+        {"\xF4\x90\x80\x80 \xFF", "\u00F4\u0090\u0080\u0080 \u00FF"}, // above U+10FFFF
+    };
+    for (const auto& [bytes, readable] : cases) {
+        const QString name = nameFromFileSystem(bytes);
+        EXPECT_EQ(nameToFileSystem(name), bytes);
+        EXPECT_EQ(readableName(name), readable) << bytes.toHex().constData();
+    }
+}
+
 // FileExist finds files, folders and wildcard matches of the last element; GetShortPath gives
 // the clean absolute path of what exists (plain files, missing ones and "" in the launch tests).
 TEST(FileSystem, FileExistAndGetShortPath) {
