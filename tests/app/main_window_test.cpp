@@ -91,6 +91,11 @@ TEST_F(MainWindow, KeepsItsPlaceAndItsMenusReachDocumentsPagesOptionSetsAndWindo
     window->resize(600, 600);
     window->showMinimized();
     EXPECT_EQ(closed(), "True 900 1500 7950 4800");
+    // A place off every screen opens on the main one and stays stored until the user moves.
+    fake.store.SaveSetting("winpos", "max", "False");
+    fake.store.SaveSetting("winpos", "left", "450000");
+    EXPECT_TRUE(QGuiApplication::primaryScreen()->availableGeometry().contains(reload().pos()));
+    EXPECT_EQ(closed(), "False 900 450000 7950 4800");
 
     reload();
     const char* const cases[][3] = {
