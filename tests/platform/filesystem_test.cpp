@@ -1,6 +1,11 @@
 #include "support/FakePlatform.h"
 
 #include "platform/FileSystem.h"
+#include "platform/QtDialogs.h"
+
+#include <QApplication>
+#include <QMessageBox>
+#include <QTimer>
 
 #include <gtest/gtest.h>
 
@@ -35,4 +40,15 @@ TEST(FileFilter, WindowsFiltersBecomeQtFilters) {
         EXPECT_EQ(qtFileFilter(filter), qt) << filter;
     EXPECT_EQ(qtSelectedFilter(rows[2].first, 2) + qtSelectedFilter(rows[2].first, 3),
               "All Files (*)");
+}
+
+// A message box shows its text as given, markup and all.
+TEST(MessageBox, ShowsPlainText) {
+    QTimer::singleShot(0, [] {
+        auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+        ASSERT_TRUE(box);
+        EXPECT_EQ(box->textFormat(), Qt::PlainText);
+        box->accept();
+    });
+    QtDialogs().MsgBox(nullptr, "<b>a.bin</b>", MsgButtons::Ok, MsgIcon::None, "lum");
 }
