@@ -96,10 +96,15 @@ class About : public ::testing::Test {
 protected:
     FakePlatform fake;
     LocalHttpServer server;
-    QPointer<frmAbout> window = new frmAbout(fake.platform, nullptr, server.base());
+    // The update server named as a mirror's would be, trailing slash and all.
+    bool bMirror = qputenv("LUM_UPDATE_URL", server.base().toUtf8() + '/');
+    QPointer<frmAbout> window = new frmAbout(fake.platform);
     QSignalSpy ends{window.data(), &frmAbout::endProgramRequested};
 
-    ~About() override { delete window.data(); }
+    ~About() override {
+        delete window.data();
+        qunsetenv("LUM_UPDATE_URL");
+    }
 
     // What the user saw and the program did since the last call, a line each: boxes, pages
     // and folders opened, programs started, the program ended.
