@@ -12,10 +12,13 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QGuiApplication>
+#include <QLabel>
+#include <QProgressDialog>
 #include <QSaveFile>
 #include <QTemporaryDir>
 #include <QUrl>
 
+#include <algorithm>
 #include <cstdio>
 #include <optional>
 #include <utility>
@@ -24,6 +27,10 @@ namespace {
 
 constexpr QLatin1String kFailedCheckTitle{"Update Check Failed"};
 constexpr QLatin1String kNoUpdateTitle{"No update needed"};
+
+// The description is small: a server that sends it a byte at a time must not hold the
+// window for longer than this.
+constexpr std::chrono::seconds kDescriptionDeadline{30};
 
 // A busy cursor for as long as a blocking download runs.
 class BusyCursor {
@@ -34,12 +41,6 @@ public:
     BusyCursor& operator=(const BusyCursor&) = delete;
 };
 
-bool isWebAddress(const QString& text) {
-    const QUrl url(text, QUrl::StrictMode);
-    const QString scheme = url.scheme().toLower();
-    return url.isValid() && (scheme == u"http" || scheme == u"https") && !url.host().isEmpty();
-}
-
 } // namespace
 
 UpdateCheck::UpdateCheck(Platform& platform, QWidget* owner, QString serverBase,
@@ -48,11 +49,11 @@ UpdateCheck::UpdateCheck(Platform& platform, QWidget* owner, QString serverBase,
       m_product(std::move(product)) {}
 
 QString UpdateCheck::localCopyPath() const {
-    return m_platform.programFolder + QStringLiteral("/tmp");
+    return m_platform.cacheFolder + QStringLiteral("/tmp");
 }
 
 QString UpdateCheck::updateFolder() const {
-    return m_platform.programFolder + QStringLiteral("/Update");
+    return m_platform.cacheFolder + QStringLiteral("/Update");
 }
 
 bool UpdateCheck::canWrite(const QString& path) {
@@ -65,19 +66,52 @@ bool UpdateCheck::canWrite(const QString& path) {
     return true;
 }
 
-bool UpdateCheck::download(const QString& url, const QString& localFilename) {
+bool UpdateCheck::downloadDescription(const QString& localFilename) {
     const BusyCursor busy;
-    return m_platform.network.DownloadFile(url, localFilename);
+    DownloadWatch watch;
+    watch.deadline = kDescriptionDeadline;
+    return m_platform.network.DownloadFile(m_serverBase + web::kUpdateDescriptionPath,
+                                           localFilename, watch);
 }
 
-bool UpdateCheck::downloadNonEmpty(const QString& url, const QString& localFilename) {
+UpdateCheck::Fetched UpdateCheck::downloadInstaller(const QString& url,
+                                                    const QString& localFilename) {
+    // Application-modal, so that nothing but its Cancel button takes input meanwhile.
+    QPointer<QProgressDialog> progress = new QProgressDialog(m_owner);
+    progress->setObjectName(QStringLiteral("progressDownload"));
+    progress->setWindowTitle(QStringLiteral("Downloading Update"));
+    progress->setWindowModality(Qt::ApplicationModal);
+    auto* label = new QLabel(progress);
+    label->setTextFormat(Qt::PlainText); // the file name comes from the server
+    label->setText(QStringLiteral("Downloading ") + QFileInfo(localFilename).fileName() +
+                   QStringLiteral(" ..."));
+    progress->setLabel(label);
+    progress->setAutoReset(false);
+    progress->setAutoClose(false);
+    progress->setRange(0, 0); // busy until the server tells the size
+    progress->show();
+
+    DownloadWatch watch;
+    watch.progress = [&progress](qint64 received, qint64 total) {
+        if (!progress)
+            return false;
+        if (total > 0) {
+            progress->setMaximum(1000);
+            progress->setValue(int(std::min(received, total) * 1000 / total));
+        }
+        return !progress->wasCanceled();
+    };
+    // The older installer stays until a new one has arrived whole and with something in it.
     const QString partial = localFilename + QStringLiteral(".part");
-    const bool ok = download(url, partial) && QFileInfo(partial).size() > 0 &&
-                    std::rename(QFile::encodeName(partial).constData(),
-                                QFile::encodeName(localFilename).constData()) == 0;
-    if (!ok)
+    const bool bArrived = m_platform.network.DownloadFile(url, partial, watch);
+    const bool bCancelled = !progress || progress->wasCanceled();
+    delete progress.data();
+    const bool bPlaced = bArrived && !bCancelled && QFileInfo(partial).size() > 0 &&
+                         std::rename(QFile::encodeName(partial).constData(),
+                                     QFile::encodeName(localFilename).constData()) == 0;
+    if (!bPlaced)
         QFile::remove(partial);
-    return ok;
+    return bPlaced ? Fetched::Whole : bCancelled ? Fetched::Cancelled : Fetched::Failed;
 }
 
 void UpdateCheck::reportFailedCheck(const QString& text) {
@@ -86,8 +120,10 @@ void UpdateCheck::reportFailedCheck(const QString& text) {
 }
 
 UpdateCheck::Outcome UpdateCheck::Run(bool forumRequest) {
-    // The program folder of an installed copy cannot be written: the description then
-    // goes to a private temporary folder, rather than the check failing as if offline.
+    // When the cache folder cannot be written (a read-only home, something in the way),
+    // the description goes to a private temporary folder, rather than the check failing
+    // as if offline.
+    QDir().mkpath(m_platform.cacheFolder);
     QString localCopy = localCopyPath();
     std::optional<QTemporaryDir> spare;
     if (!canWrite(localCopy)) {
@@ -95,7 +131,7 @@ UpdateCheck::Outcome UpdateCheck::Run(bool forumRequest) {
         if (spare->isValid())
             localCopy = spare->filePath(QStringLiteral("tmp"));
     }
-    if (!download(m_serverBase + web::kUpdateDescriptionPath, localCopy)) {
+    if (!downloadDescription(localCopy)) {
         reportFailedCheck(QStringLiteral("Failed to connect to the internet"));
         return Outcome::Finished;
     }
@@ -170,6 +206,14 @@ UpdateCheck::Outcome UpdateCheck::runUpdate(const UpdateSection& section) {
                               .arg(section.installerFileName));
         return Outcome::Finished;
     }
+    // Nor may the description send the user's machine elsewhere for the program it runs.
+    if (!isTrustedInstallerAddress(section.installerUrl, m_serverBase)) {
+        reportFailedCheck(QStringLiteral("The update offers its installer from an address that "
+                                         "cannot be trusted: \"%1\"\nUpdates are only "
+                                         "downloaded over https from %2.")
+                              .arg(section.installerUrl, QUrl(m_serverBase).host()));
+        return Outcome::Finished;
+    }
 
     const MsgResult answer = m_platform.dialogs.MsgBox(
         m_owner,
@@ -183,8 +227,12 @@ UpdateCheck::Outcome UpdateCheck::runUpdate(const UpdateSection& section) {
     const QString installerPath = updateFolder() + u'/' + section.installerFileName;
     if (!QFileInfo(updateFolder()).isDir())
         QDir().mkpath(updateFolder());
-    // An installer arrives whole and with something in it, or the older one stays.
-    if (!downloadNonEmpty(section.installerUrl, installerPath)) {
+    switch (downloadInstaller(section.installerUrl, installerPath)) {
+    case Fetched::Whole:
+        break;
+    case Fetched::Cancelled:
+        return Outcome::Finished; // the user's choice: nothing to report
+    case Fetched::Failed:
         m_platform.dialogs.MsgBox(m_owner, QStringLiteral("Failed to Download Update"),
                                   MsgButtons::Ok, MsgIcon::None, QStringLiteral("Download Failed"));
         return Outcome::Finished;
@@ -207,6 +255,7 @@ UpdateCheck::Outcome UpdateCheck::runUpdate(const UpdateSection& section) {
                                   QDir::toNativeSeparators(installerPath) + u'\n',
                               MsgButtons::Ok, MsgIcon::Information,
                               QStringLiteral("Download Complete"));
-    m_platform.shell.OpenFolder(m_platform.programFolder);
+    // The folder that holds the installer: it no longer lies inside the program folder.
+    m_platform.shell.OpenFolder(updateFolder());
     return Outcome::Finished;
 }

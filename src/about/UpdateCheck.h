@@ -27,18 +27,19 @@ public:
 
     Outcome Run(bool forumRequest);
 
-    // Where the description file is kept: the program folder's "tmp" (a private temporary
-    // folder when the program folder cannot be written).
+    // Where the description file is kept: "tmp" in the cache folder (a private temporary
+    // folder when that cannot be written). The program folder is read-only once installed.
     QString localCopyPath() const;
-    // Where installers go: the program folder's "Update".
+    // Where installers go: "Update" in the cache folder.
     QString updateFolder() const;
 
 private:
     Outcome runUpdate(const UpdateSection& section);
     void openForum(const UpdateSection& section);
-    bool download(const QString& url, const QString& localFilename);
-    // Downloads beside the target and puts the file in place only when it holds something.
-    bool downloadNonEmpty(const QString& url, const QString& localFilename);
+    enum class Fetched { Whole, Failed, Cancelled };
+    bool downloadDescription(const QString& localFilename);
+    // Shows the download's progress with a Cancel button, over the owner.
+    Fetched downloadInstaller(const QString& url, const QString& localFilename);
     // Whether a file can be written at `path` (an existing one replaced).
     static bool canWrite(const QString& path);
     void reportFailedCheck(const QString& text);

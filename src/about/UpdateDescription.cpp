@@ -3,6 +3,7 @@
 #include "lum_version.h"
 
 #include <QIODevice>
+#include <QUrl>
 
 namespace {
 
@@ -55,6 +56,20 @@ std::optional<qint64> parseVersionNumber(const QString& line) {
 
 bool isSectionHeader(const QString& line, const QString& productName) {
     return line.size() >= 3 && line.startsWith(u"::") && QStringView(line).mid(2) == productName;
+}
+
+bool isWebAddress(const QString& text) {
+    const QUrl url(text, QUrl::StrictMode);
+    const QString scheme = url.scheme().toLower();
+    return url.isValid() && (scheme == u"http" || scheme == u"https") && !url.host().isEmpty();
+}
+
+bool isTrustedInstallerAddress(const QString& address, const QString& serverBase) {
+    const QUrl url(address, QUrl::StrictMode);
+    const QUrl server(serverBase, QUrl::StrictMode);
+    return isWebAddress(address) && url.host() == server.host() &&
+           (url.scheme().toLower() == u"https" ||
+            url.scheme().toLower() == server.scheme().toLower());
 }
 
 bool isSafeInstallerFileName(const QString& name) {

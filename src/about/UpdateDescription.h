@@ -36,6 +36,14 @@ bool isSectionHeader(const QString& line, const QString& productName);
 // absolute, no path separator, no "..", no control characters.
 bool isSafeInstallerFileName(const QString& name);
 
+// An http or https address with a host: what the description may have the desktop open.
+bool isWebAddress(const QString& text);
+
+// An installer is fetched only over https from the host that served the description (the
+// update server, `serverBase`); plain http only when the description itself came that way
+// from that host, as from a local mirror, which the installer then trusts no less.
+bool isTrustedInstallerAddress(const QString& address, const QString& serverBase);
+
 // The section of the update description file that belongs to one product.
 struct UpdateSection {
     enum class Status {

@@ -7,6 +7,7 @@
 #include "platform/Downloader.h"
 #include "platform/Platform.h"
 #include "platform/Shell.h"
+#include "platform/WebAddresses.h"
 #include "ui/Twips.h"
 
 #include <QCloseEvent>
@@ -69,10 +70,19 @@ QFrame* makeLine(QWidget* parent) {
     return line;
 }
 
+// Mirrors, packagers and tests choose another update server through the environment.
+QString updateServerBase() {
+    QString base = qEnvironmentVariable("LUM_UPDATE_URL").trimmed();
+    while (base.endsWith(u'/'))
+        base.chop(1);
+    return base.isEmpty() ? QString(web::kUpdateServer) : base;
+}
+
 } // namespace
 
 frmAbout::frmAbout(Platform& platform, QWidget* parent, QString updateServer)
-    : QDialog(parent), m_platform(platform), m_updateServer(std::move(updateServer)) {
+    : QDialog(parent), m_platform(platform),
+      m_updateServer(updateServer.isEmpty() ? updateServerBase() : std::move(updateServer)) {
     setObjectName(QStringLiteral("frmAbout"));
     setWindowTitle(QStringLiteral("About"));
     setModal(false);

@@ -1,7 +1,5 @@
 #pragma once
 
-#include "platform/WebAddresses.h"
-
 #include <QDialog>
 #include <QPixmap>
 
@@ -17,9 +15,9 @@ class frmAbout : public QDialog {
     Q_OBJECT
 public:
     // `updateServer` serves the update description file and the forum (scheme and host,
-    // no trailing slash).
-    explicit frmAbout(Platform& platform, QWidget* parent = nullptr,
-                      QString updateServer = QString(web::kUpdateServer));
+    // no trailing slash). Empty: $LUM_UPDATE_URL when set (a mirror, a packager's own
+    // server), else the maker's server.
+    explicit frmAbout(Platform& platform, QWidget* parent = nullptr, QString updateServer = {});
     ~frmAbout() override;
 
     void StartSysInfo();

@@ -47,7 +47,8 @@ public:
 };
 
 // "Image Files|*.jpg;*.png|All Files (*.*)|*.*" in the form Qt's file dialogs take:
-// "Image Files (*.jpg *.png);;All Files (*.*) (*)". Entries keep their order.
+// "Image Files (*.jpg *.png);;All Files (*)". Each entry shows its patterns once: a label
+// that ends in a pattern list has it replaced by the entry's own. Entries keep their order.
 QString qtFileFilter(const QString& filter);
 // The 1-based filter index's entry in qtFileFilter's form, or empty when out of range.
 QString qtSelectedFilter(const QString& filter, int filterIndex);

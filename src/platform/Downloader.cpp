@@ -5,13 +5,15 @@
 #include <QNetworkReply>
 #include <QNetworkRequest>
 #include <QSaveFile>
+#include <QTimer>
 #include <QUrl>
 
 QtDownloader::QtDownloader(std::chrono::milliseconds stallTimeout) : m_stallTimeout(stallTimeout) {}
 
 QtDownloader::~QtDownloader() = default;
 
-bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename) {
+bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename,
+                                const DownloadWatch& watch) {
     const QUrl url(URL, QUrl::StrictMode);
     const QString scheme = url.scheme().toLower();
     // Only the web: a description file must not be able to copy local files around.
@@ -41,14 +43,45 @@ bool QtDownloader::DownloadFile(const QString& URL, const QString& LocalFilename
         written += chunk.size();
     };
     QEventLoop loop;
+    qint64 total = -1;
+    bool bReporting = false;
+    const auto report = [&] {
+        // The watcher may run events itself (a modal progress window does); a report that
+        // arrives meanwhile is skipped rather than nested.
+        if (!watch.progress || bReporting || reply->isFinished())
+            return;
+        bReporting = true;
+        const bool bGoOn = watch.progress(written, total);
+        bReporting = false;
+        if (!bGoOn)
+            reply->abort();
+    };
     QObject::connect(reply, &QNetworkReply::readyRead, &loop, [&] {
         store(reply->readAll());
         if (writeFailed)
             reply->abort();
+        else
+            report();
     });
+    QObject::connect(reply, &QNetworkReply::downloadProgress, &loop,
+                     [&](qint64, qint64 all) { total = all; });
     QObject::connect(reply, &QNetworkReply::finished, &loop, &QEventLoop::quit);
+    // A cancel must be noticed while the server is silent too.
+    QTimer tick;
+    QObject::connect(&tick, &QTimer::timeout, &loop, report);
+    if (watch.progress)
+        tick.start(std::chrono::milliseconds(100));
+    // The stall timeout restarts with every byte; a server that trickles them must not
+    // hold the caller past its deadline.
+    QTimer deadline;
+    deadline.setSingleShot(true);
+    QObject::connect(&deadline, &QTimer::timeout, reply, &QNetworkReply::abort);
+    if (watch.deadline.count() > 0)
+        deadline.start(watch.deadline);
     if (!reply->isFinished())
-        loop.exec(QEventLoop::ExcludeUserInputEvents);
+        loop.exec(watch.progress ? QEventLoop::AllEvents : QEventLoop::ExcludeUserInputEvents);
+    tick.stop();
+    deadline.stop();
 
     if (reply->isOpen())
         store(reply->readAll());

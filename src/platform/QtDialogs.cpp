@@ -62,6 +62,8 @@ QString runFileDialog(QWidget* owner, const FileDialogRequest& request,
 MsgResult QtDialogs::MsgBox(QWidget* owner, const QString& text, MsgButtons buttons, MsgIcon icon,
                             const QString& title) {
     QMessageBox box(qtIcon(icon), title, text, qtButtons(buttons), owner);
+    // Texts quote file names, server lines and system errors: never read them as markup.
+    box.setTextFormat(Qt::PlainText);
     switch (box.exec()) {
     case QMessageBox::Ok:
         return MsgResult::Ok;

@@ -14,7 +14,8 @@ inline constexpr QLatin1String kZ26HomePage{"https://www.whimsey.com/z26/"};
 // description file and the forum.
 inline constexpr QLatin1String kMakerWebServer{"https://lum.example.org"};
 inline constexpr QLatin1String kLumHomePage{"https://lum.example.org/"};
-// Paths on the update server (the maker's web server unless a test points elsewhere).
+// Paths on the update server (the maker's web server unless $LUM_UPDATE_URL or a test
+// points elsewhere).
 inline constexpr QLatin1String kUpdateServer{"https://lum.example.org"};
 inline constexpr QLatin1String kUpdateDescriptionPath{"/programs/update.txt"};
 inline constexpr QLatin1String kForumPath{"/forum"};

@@ -11,6 +11,7 @@
 #include "ui/Twips.h"
 
 #include <QPointer>
+#include <QProgressDialog>
 #include <QTimer>
 
 #include <gtest/gtest.h>
@@ -50,6 +51,15 @@ TEST(UpdateDescription, VersionsHeadersAndInstallerNames) {
     for (const char* bad : {"", " ", ".", "..", "../setup.exe", "/tmp/setup.exe", "sub/setup.exe",
                             "..\\setup.exe", "C:\\setup.exe", "bad\nname"})
         EXPECT_FALSE(isSafeInstallerFileName(QString::fromUtf8(bad))) << bad;
+
+    // Installers only over https from the update server's host (the About tests try http).
+    for (const char* good : {"https://lum.example.org/setup.run", "https://LUM.example.org:8443/s"})
+        EXPECT_TRUE(isTrustedInstallerAddress(good, "https://lum.example.org")) << good;
+    for (const char* bad :
+         {"http://lum.example.org/s", "https://example.org/s", "https://lum.example.org.evil.com/s",
+          "https://lum.example.org@evil.com/s", "ftp://lum.example.org/s", "file:///tmp/s",
+          "setup.run", ""})
+        EXPECT_FALSE(isTrustedInstallerAddress(bad, "https://lum.example.org")) << bad;
 }
 
 // The forum line alone in forum mode, every line otherwise; CR LF or LF; after 8 MiB of
@@ -86,10 +96,15 @@ class About : public ::testing::Test {
 protected:
     FakePlatform fake;
     LocalHttpServer server;
-    QPointer<frmAbout> window = new frmAbout(fake.platform, nullptr, server.base());
+    // The update server named as a mirror's would be, trailing slash and all.
+    bool bMirror = qputenv("LUM_UPDATE_URL", server.base().toUtf8() + '/');
+    QPointer<frmAbout> window = new frmAbout(fake.platform);
     QSignalSpy ends{window.data(), &frmAbout::endProgramRequested};
 
-    ~About() override { delete window.data(); }
+    ~About() override {
+        delete window.data();
+        qunsetenv("LUM_UPDATE_URL");
+    }
 
     // What the user saw and the program did since the last call, a line each: boxes, pages
     // and folders opened, programs started, the program ended.
@@ -220,22 +235,31 @@ TEST_F(About, WhatEachDescriptionLeadsTo) {
         {false, section("1049613", {}, "../setup.run"), Yes,
          kFailedCheck + "The update names an installer file that cannot be accepted: "
                         "\"../setup.run\" | Ok | Information\n"},
+        {false, section("1049613").replace("127.0.0.1", "localhost"), Yes,
+         kFailedCheck +
+             "The update offers its installer from an address that cannot be trusted: \"" +
+             server.base().replace("127.0.0.1", "localhost").toStdString() +
+             "/files/setup.run\"\nUpdates are only downloaded over https from 127.0.0.1. | Ok | "
+             "Information\n"},
     };
     for (const auto& [forumMode, description, answer, did] : rows)
         EXPECT_EQ(check(forumMode, description, answer), did) << description.toStdString();
     EXPECT_FALSE(server.requests.contains("/files/setup.run"));
-    EXPECT_EQ(folderEntries(fake.programFolder()), QStringList{"tmp"});
+    EXPECT_EQ(folderEntries(fake.platform.cacheFolder).join(' ') + " | " +
+                  folderEntries(fake.programFolder()).join(' '),
+              "tmp | ");
 }
 
 // Run flag 1 starts the installer and ends the program, unless it will not start. A failed
-// download leaves the Update folder as it was. A read-only program folder (an installed
-// copy) keeps the description elsewhere, so the check still works.
+// or cancelled download leaves the Update folder as it was. A read-only cache folder keeps
+// the description elsewhere, so the check still works.
 TEST_F(About, Downloads) {
-    enum Limit { None, WontStart, ReadOnly };
-    const QString program = fake.programFolder(), update = program + "/Update";
+    enum Limit { None, WontStart, ReadOnly, Cancel };
+    const QString program = fake.programFolder(), cache = fake.makeFolder("cache/lum"),
+                  update = cache + "/Update";
     const std::string installer = update.toStdString() + "/setup.run";
     const std::string kept = "Download Complete | The update has been downloaded to " + installer +
-                             "\n | Ok | Information\nshow " + program.toStdString() + '\n';
+                             "\n | Ok | Information\nshow " + update.toStdString() + '\n';
     const std::string start =
         "start " + installer + " /SP- /silent /noicons /dir=" + program.toStdString() + '\n';
     const std::string failed = "Download Failed | Failed to Download Update | Ok | None\n";
@@ -248,19 +272,27 @@ TEST_F(About, Downloads) {
         {nullptr, "NEW", "1", WontStart, kAsk + kept + start + "setup.run NEW"},
         {nullptr, nullptr, "0", None, kAsk + failed + " <unreadable>"},
         {"OLD", "", "0", None, kAsk + failed + "setup.run OLD"},
+        {"OLD", "NEW", "0", Cancel, kAsk + "setup.run OLD"},
         {nullptr, "NEW", "0", ReadOnly, kAsk + failed + " <unreadable>"},
         {"/", "NEW", "0", None, kAsk + failed + "setup.run <unreadable>"}, // a folder in its place
     };
     for (const auto& [before, body, runFlag, limit, did] : rows) {
-        QFile::setPermissions(program, writable);
+        QFile::setPermissions(cache, writable);
         QDir(update).removeRecursively();
         if (before && *before == '/')
-            fake.makeFolder("program/Update/setup.run");
+            fake.makeFolder("cache/lum/Update/setup.run");
         else if (before)
-            fake.writeFile("program/Update/setup.run", before);
-        server.responses["/files/setup.run"] = {body ? 200 : 404, body, {}, false, -1};
+            fake.writeFile("cache/lum/Update/setup.run", before);
+        server.responses["/files/setup.run"] = {body ? 200 : 404, body, {}, limit == Cancel};
+        if (limit == Cancel) // once the download waits, as the user would
+            QTimer::singleShot(300, window, [this] {
+                auto* progress = window->findChild<QProgressDialog*>();
+                ASSERT_TRUE(progress && progress->isVisible());
+                EXPECT_EQ(progress->findChild<QLabel*>()->textFormat(), Qt::PlainText);
+                QTest::mouseClick(progress->findChild<QPushButton*>(), Qt::LeftButton);
+            });
         fake.shell.succeed = limit != WontStart;
-        QFile::setPermissions(program, limit == ReadOnly ? writable ^ QFile::WriteOwner : writable);
+        QFile::setPermissions(cache, limit == ReadOnly ? writable ^ QFile::WriteOwner : writable);
         const NoPermissionOverride asAnyone;
         ASSERT_TRUE(asAnyone.holds());
         std::string seen = check(false, section("1049613", {}, "setup.run", runFlag));

@@ -7,7 +7,8 @@
 namespace {
 
 // A success replaces the older file with the whole body, after redirects; a failure returns
-// false (a silent server within the stall time) and leaves the older file alone, nothing beside.
+// false (a silent server within the stall time, a trickling one by the deadline) and leaves
+// the older file alone, nothing beside.
 TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     QTemporaryDir dir;
     LocalHttpServer server;
@@ -18,18 +19,22 @@ TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     server.serve("/new", body);
     server.fail("/broken", 500);
     server.stall("/silent");
+    server.responses["/trickle"] = {200, QByteArray(100, 'x'), {}, false, -1, true}; // 5 s
     server.cutOff("/cut", body.left(1000), body.size());
     ASSERT_TRUE(putFile(target, "older"));
     EXPECT_TRUE(downloader.DownloadFile(server.base() + "/old", target));
     EXPECT_EQ(fileBytes(target), body);
-    // Not found, an error, silence, a body cut off, refused, no web address, none, a full disk.
+    // Not found, an error, silence, trickling, a body cut off, refused, no web address, none,
+    // a full disk.
     const DiskFull full(1000);
     for (const QString& url :
          {server.base() + "/gone", server.base() + "/broken", server.base() + "/silent",
-          server.base() + "/cut", LocalHttpServer::refusedBase() + "/any",
-          QStringLiteral("file:///etc/hostname"), QString(), server.base() + "/new"}) {
+          server.base() + "/trickle", server.base() + "/cut",
+          LocalHttpServer::refusedBase() + "/any", QStringLiteral("file:///etc/hostname"),
+          QString(), server.base() + "/new"}) {
         ASSERT_TRUE(putFile(target, "older"));
-        EXPECT_FALSE(downloader.DownloadFile(url, target)) << url.toStdString();
+        EXPECT_FALSE(downloader.DownloadFile(url, target, {std::chrono::milliseconds(1500), {}}))
+            << url.toStdString();
         EXPECT_EQ(fileBytes(target) + folderEntries(dir.path()).join(' ').toUtf8(), "olderfile.bin")
             << url.toStdString();
     }

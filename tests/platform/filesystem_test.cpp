@@ -1,6 +1,11 @@
 #include "support/FakePlatform.h"
 
 #include "platform/FileSystem.h"
+#include "platform/QtDialogs.h"
+
+#include <QApplication>
+#include <QMessageBox>
+#include <QTimer>
 
 #include <gtest/gtest.h>
 
@@ -40,9 +45,29 @@ TEST(FileSystem, FileExistAndGetShortPath) {
         EXPECT_EQ(std::pair(FileExist(path), GetShortPath(path)), std::pair(exists, shortPath));
 }
 
+// Each entry shows its patterns once, in Qt's form, whether or not its label showed them.
 TEST(FileFilter, WindowsFiltersBecomeQtFilters) {
-    const QString filter = "Pictures (*.jpg,*.png)|*.jpg;*.png|All Files (*.*)|*.*";
-    EXPECT_EQ(qtFileFilter(filter), "Pictures (*.jpg,*.png) (*.jpg *.png);;All Files (*.*) (*)");
-    EXPECT_EQ(qtSelectedFilter(filter, 2) + qtSelectedFilter(filter, 3), "All Files (*.*) (*)");
-    EXPECT_EQ(qtFileFilter("lum Settings|*.lum"), "lum Settings (*.lum)");
+    const std::pair<const char*, const char*> rows[] = {
+        {"lum configurations (*.lum)|*.lum", "lum configurations (*.lum)"},
+        {"z26 executable (z26)|z26", "z26 executable (z26)"},
+        {"Pictures (*.jpg,*.png)|*.jpg; *.png|All Files (*.*)|*.*",
+         "Pictures (*.jpg *.png);;All Files (*)"},
+        {"lum Settings|*.lum", "lum Settings (*.lum)"},
+        {"Notes (old)|*.txt", "Notes (old) (*.txt)"},
+    };
+    for (const auto& [filter, qt] : rows)
+        EXPECT_EQ(qtFileFilter(filter), qt) << filter;
+    EXPECT_EQ(qtSelectedFilter(rows[2].first, 2) + qtSelectedFilter(rows[2].first, 3),
+              "All Files (*)");
+}
+
+// A message box shows its text as given, markup and all.
+TEST(MessageBox, ShowsPlainText) {
+    QTimer::singleShot(0, [] {
+        auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+        ASSERT_TRUE(box);
+        EXPECT_EQ(box->textFormat(), Qt::PlainText);
+        box->accept();
+    });
+    QtDialogs().MsgBox(nullptr, "<b>a.bin</b>", MsgButtons::Ok, MsgIcon::None, "lum");
 }

@@ -5,6 +5,7 @@
 #include <QStringList>
 #include <QTcpServer>
 #include <QTcpSocket>
+#include <QTimer>
 
 #include <map>
 #include <memory>
@@ -21,6 +22,7 @@ public:
         // When set, the length announced in the headers; the connection then closes after
         // `body`, as when a transfer is cut off.
         qsizetype claimedLength = -1;
+        bool trickle = false; // send the body a byte every 50 ms
     };
 
     LocalHttpServer() {
@@ -86,8 +88,21 @@ private:
                            QByteArray::number(length) + "\r\n";
         if (!response.location.isEmpty())
             reply += "Location: " + response.location + "\r\n";
-        socket->write(reply + "Connection: close\r\n\r\n" + response.body);
-        socket->disconnectFromHost();
+        socket->write(reply + "Connection: close\r\n\r\n");
+        if (!response.trickle) {
+            socket->write(response.body);
+            socket->disconnectFromHost();
+            return;
+        }
+        auto* timer = new QTimer(socket);
+        QObject::connect(timer, &QTimer::timeout, socket,
+                         [socket, body = response.body, sent = 0]() mutable {
+                             if (sent < body.size())
+                                 socket->write(body.mid(sent++, 1));
+                             else
+                                 socket->disconnectFromHost();
+                         });
+        timer->start(50);
     }
 
     QTcpServer m_server;
