@@ -7,6 +7,7 @@
 #include <QSaveFile>
 #include <QtEndian>
 
+#include <algorithm>
 #include <cmath>
 #include <cstring>
 #include <limits>
@@ -171,7 +172,24 @@ std::optional<SliderScale> soundQueueScaleFor(float stored) {
     // would refuse a value outside its range.
     if (!min || !max || !value || *value < *min || *value > *max)
         return std::nullopt;
-    return SliderScale{*min, *max, *value};
+    // A set of one or two digits re-centres below 1, where the bar must not go: z26 takes
+    // no queue of 0 or less.
+    return soundQueueOnScale(*min, *max, *value);
+}
+
+SliderScale soundQueueOnScale(qint64 min, qint64 max, qint64 value) {
+    constexpr qint64 kTopWindowMin = 65339;
+    constexpr qint64 kBottomWindowMax = 201;
+    if (max > kSoundQueueHighest) {
+        max = kSoundQueueHighest;
+        min = kTopWindowMin;
+    }
+    if (min < kSoundQueueLowest) {
+        min = kSoundQueueLowest;
+        max = kBottomWindowMax;
+    }
+    return {static_cast<int>(min), static_cast<int>(max),
+            static_cast<int>(std::clamp(value, min, max))};
 }
 
 QString withLumExtension(const QString& path) {

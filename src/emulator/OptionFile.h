@@ -58,8 +58,17 @@ struct SliderScale {
     bool operator==(const SliderScale&) const = default;
 };
 
+// The sound queue's whole scale, of which its bar shows a window 200 wide; z26 takes no
+// queue outside it.
+inline constexpr int kSoundQueueLowest = 1;
+inline constexpr int kSoundQueueHighest = 65536;
+
+// The window held on the scale (1..201 at the bottom, 65339..65536 at the top: a window of
+// 197 there), then the value held in the window.
+SliderScale soundQueueOnScale(qint64 min, qint64 max, qint64 value);
+
 // The sound queue's bar as a stored value shows it: the range re-centred on the value's
-// hundreds (the decimal text without its last two digits), then the value. Empty when the
-// value cannot be shown that way (not a whole number within the range it makes, or beyond
-// the bar's 32-bit range).
+// hundreds (the decimal text without its last two digits), then the value, both held on the
+// scale as above. Empty when the value cannot be shown that way (not a whole number within
+// the range it makes, or beyond the bar's 32-bit range).
 std::optional<SliderScale> soundQueueScaleFor(float stored);
