@@ -15,6 +15,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QCoreApplication>
+#include <QDir>
 #include <QEvent>
 #include <QFileInfo>
 #include <QFocusEvent>
@@ -58,13 +59,15 @@ void showFrame(QWidget* frame, bool bOn) {
     frame->setEnabled(bOn);
 }
 
-// The option-set chooser of both buttons, opening in the program folder.
-FileDialogRequest optionSetRequest(const QString& programFolder, unsigned flags) {
+// The option-set chooser of both buttons. It opens in the user's own folder, made if need
+// be, where a Default.lum saved becomes the options lum starts with.
+FileDialogRequest optionSetRequest(const QString& userFolder, unsigned flags) {
+    QDir().mkpath(userFolder);
     FileDialogRequest request;
     request.title = kDialogTitle;
     request.filter = kDialogFilter;
     request.filterIndex = 1;
-    request.initialFolder = programFolder;
+    request.initialFolder = userFolder;
     request.flags = flags;
     return request;
 }
@@ -245,7 +248,7 @@ void frmSettings::showConfigStatus(const QString& text, const QString& tip) {
 
 void frmSettings::cmdSaveDat_Click() {
     const QString chosen = m_platform.dialogs.ShowSave(
-        this, optionSetRequest(m_platform.programFolder, kFlagOverwritePrompt));
+        this, optionSetRequest(m_platform.userFolder, kFlagOverwritePrompt));
     if (chosen.isEmpty())
         return;
 
@@ -271,7 +274,7 @@ void frmSettings::cmdSaveDat_Click() {
 
 void frmSettings::cmdLoadDat_Click() {
     const QString path = m_platform.dialogs.ShowOpen(
-        this, optionSetRequest(m_platform.programFolder, kFlagPathMustExist | kFlagFileMustExist));
+        this, optionSetRequest(m_platform.userFolder, kFlagPathMustExist | kFlagFileMustExist));
     if (path.isEmpty())
         return;
 

@@ -25,15 +25,18 @@ protected:
 TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     auto w = open();
     w->showConfigStatus("before", "tip");
+    // The choosers open in the user's folder, made if missing, where Default.lum starts lum.
+    QDir(fake.platform.userFolder).removeRecursively();
     w->cmdSaveDat_Click(); // cancelled
     w->cmdLoadDat_Click(); // cancelled
     EXPECT_EQ(status(*w), "before");
     EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "tip");
     const std::string chooser = " | Choose File to Save Configuration | lum configurations "
                                 "(*.lum)|*.lum|All Files (*.*)|*.* | " +
-                                fake.programFolder().toStdString() + " | 1 | ";
+                                fake.platform.userFolder.toStdString() + " | 1 | ";
     EXPECT_EQ(requestLines(fake.dialogs),
               (Lines{"save" + chooser + "2", "open" + chooser + "1800"}));
+    EXPECT_TRUE(QFileInfo(fake.platform.userFolder).isDir());
 
     // The name as chosen in the status line; ".lum" added unless the name ends in it.
     control<QRadioButton>(*w, "optCPPAL")->click();
