@@ -198,18 +198,19 @@ QString withLumExtension(const QString& path) {
     return path + QStringLiteral(".lum");
 }
 
-bool writeOptionFile(const QString& path, const EmulatorOptions& options) {
+bool writeOptionFile(const QString& path, const EmulatorOptions& options, QString* whyNot) {
     const QByteArray bytes = encodeOptions(options);
     QSaveFile file(path);
     // Unbuffered, so a short write (a full disk) shows here: a buffered one is flushed by
     // commit(), which does not notice it and would put a cut-off file in place.
-    if (!file.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
-        return false;
-    if (file.write(bytes) != bytes.size()) {
+    const bool bWritten = file.open(QIODevice::WriteOnly | QIODevice::Unbuffered) &&
+                          file.write(bytes) == bytes.size() && file.commit();
+    if (!bWritten) {
+        if (whyNot)
+            *whyNot = file.errorString();
         file.cancelWriting();
-        return false;
     }
-    return file.commit();
+    return bWritten;
 }
 
 OptionSetRead readOptionFile(const QString& path, const EmulatorOptions& base) {
@@ -218,21 +219,27 @@ OptionSetRead readOptionFile(const QString& path, const EmulatorOptions& base) {
     unreadable.options = base;
 
     // Only regular files: a folder cannot be read and a pipe or device could block.
-    if (!QFileInfo(path).isFile())
+    const QFileInfo info(path);
+    if (!info.isFile()) {
+        unreadable.error = info.exists() ? QStringLiteral("It is not a file.")
+                                         : QStringLiteral("No such file or directory");
         return unreadable;
+    }
     QFile file(path);
-    if (!file.open(QIODevice::ReadOnly))
-        return unreadable;
     QByteArray bytes;
     bytes.reserve(kOptionSetSize);
-    // read() may return less than asked for before the end, so read until full or done.
-    while (bytes.size() < kOptionSetSize) {
-        const QByteArray chunk = file.read(kOptionSetSize - bytes.size());
-        if (chunk.isEmpty())
-            break;
-        bytes += chunk;
+    if (file.open(QIODevice::ReadOnly)) {
+        // read() may return less than asked for before the end, so read until full or done.
+        while (bytes.size() < kOptionSetSize) {
+            const QByteArray chunk = file.read(kOptionSetSize - bytes.size());
+            if (chunk.isEmpty())
+                break;
+            bytes += chunk;
+        }
     }
-    if (file.error() != QFileDevice::NoError)
+    if (file.error() != QFileDevice::NoError) {
+        unreadable.error = file.errorString();
         return unreadable;
+    }
     return decodeOptions(bytes, base);
 }

@@ -25,6 +25,8 @@ struct OptionSetRead {
     EmulatorOptions options;
     // The row of optionTable() that could not be applied, or -1.
     int firstBad = -1;
+    // Why an Unreadable set could not be read, in the system's words where it gave some.
+    QString error;
 
     bool ok() const { return status == Status::Ok; }
 };
@@ -43,8 +45,9 @@ QString withLumExtension(const QString& path);
 
 // Writes the set as the whole file. The bytes go to a temporary file in the same folder
 // that is renamed into place, so a failure leaves any older file as it was and no
-// half-written one. False when the file could not be written.
-bool writeOptionFile(const QString& path, const EmulatorOptions& options);
+// half-written one. False when the file could not be written, with the reason in `whyNot`.
+bool writeOptionFile(const QString& path, const EmulatorOptions& options,
+                     QString* whyNot = nullptr);
 
 // Reads a set and applies it to `base`. A path that is not a regular file or cannot be
 // read is Unreadable and applies nothing.

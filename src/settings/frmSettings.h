@@ -61,12 +61,15 @@ public:
     void editSwitches();
 
     // Option sets (.lum files). LoadSettings shows the set's options and returns false,
-    // after saying so, when the file is corrupt; the two buttons (also the main window's
-    // File menu) ask for a file and report in the status line.
+    // after saying so, when the file is corrupt; the two buttons ask for a file and report
+    // in the status line. The main window's File menu does the same, and says a failure in
+    // a message box too, naming the file and why, as this window may be out of sight.
     bool LoadSettings(const QString& path);
     bool LoadSettings(const OptionSetRead& optionSet);
     void cmdSaveDat_Click();
     void cmdLoadDat_Click();
+    void saveOptionSetFromMenu();
+    void loadOptionSetFromMenu();
     // The status line of the Save/Load frame and its tool tip.
     void showConfigStatus(const QString& text, const QString& tip);
 
@@ -128,7 +131,10 @@ private:
     bool numberFieldEvent(QObject* watched, QEvent* event);
     void comboVideoMode_Click();
     void chkDOSSwitch_Click();
-    bool reportCorruptOptionSet();
+    void saveOptionSet(bool bFromMenu);
+    void loadOptionSet(bool bFromMenu);
+    // The corrupt-set box: the fixed words, or `why` when it is given.
+    bool reportCorruptOptionSet(const QString& why);
     void showControlPic(bool bLeft);
 
     // Slider bars.

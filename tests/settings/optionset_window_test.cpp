@@ -79,16 +79,31 @@ TEST_F(OptionSetButtons, ACorruptSetIsReportedWithWhatCameBeforeTheBadValueShown
     EXPECT_TRUE(w->isVisible());
     EXPECT_EQ(w->selectedPage(), "Settings");
 
-    // A file that cannot be read applies nothing and is reported alike.
-    EXPECT_FALSE(w->LoadSettings(fake.root() + "/missing.lum"));
+    // From the main menu the box names the file and why; one that cannot be read applies
+    // nothing.
+    fake.dialogs.paths = {fake.root() + "/missing.lum"};
+    w->loadOptionSetFromMenu();
+    EXPECT_EQ(
+        boxLine(fake.dialogs.boxes.back()),
+        "lum | " + fake.root().toStdString() +
+            "/missing.lum could not be loaded:\nNo such file or directory | Ok | Exclamation");
     EXPECT_EQ(w->options().videoMode, 3);
-    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(status(*w),
+              "missing.lum is corrupt.  Plese verify settings an re-save to correct the problem");
 }
 
 TEST_F(OptionSetButtons, SavingNeverLosesAFile) {
     auto w = open();
     save(*w, fake.root() + "/no such folder/set");
     EXPECT_EQ(status(*w), "error saving set");
+    // From the main menu a box names the file and why.
+    fake.dialogs.paths = {fake.root() + "/no such folder/set"};
+    w->saveOptionSetFromMenu();
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines{"lum | " + fake.root().toStdString() +
+                    "/no such folder/set.lum could not be saved:\nNo such file or directory | Ok | "
+                    "Exclamation"});
+    fake.dialogs.boxes.clear();
 
     const QString older = fake.root() + "/older.lum";
     ASSERT_TRUE(putFile(older, QByteArray(172, '\x11')));
