@@ -406,9 +406,20 @@ void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
 
 void frmSettings::SetZ26Path(const QString& path) {
     const QString executable = completeZ26Path(path);
-    if (QFileInfo(executable).isFile()) {
+    const QFileInfo found(executable);
+    if (found.isFile() && found.isExecutable()) {
         m_ui->txtDefPathz26->setText(executable);
         write(m_platform.store, stored::z26Path, executable);
+        return;
+    }
+    // A file that is there but cannot be run (a text file, a z26 without its execute
+    // permission, a folder named z26) is named, so the user sees which one was refused.
+    if (found.exists() || QFileInfo(path).isFile()) {
+        m_platform.dialogs.MsgBox(
+            this,
+            QDir::toNativeSeparators(found.exists() ? executable : path) +
+                QStringLiteral(" is not a program lum can start.\nChoose the z26 program."),
+            MsgButtons::Ok, MsgIcon::Exclamation, QStringLiteral("Not a Program"));
         return;
     }
     m_platform.dialogs.MsgBox(

@@ -178,6 +178,8 @@ TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
     const QString emu = fake.makeFolder("emu");
     const QString executable = fake.writeFile("emu/z26");
     const QString upper = fake.writeFile("other/Z26");
+    for (const QString& program : {executable, upper})
+        QFile::setPermissions(program, QFile::ReadOwner | QFile::ExeOwner);
     auto w = open();
     auto* box = control<QLineEdit>(*w, "txtDefPathz26");
     EXPECT_EQ(box->text(), fake.programFolder() + "/z26"); // until one is chosen
@@ -200,17 +202,25 @@ TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
     EXPECT_TRUE(fake.dialogs.boxes.empty());
     EXPECT_EQ(control<QLineEdit>(*open(), "txtDefPathz26")->text(), upper);
 
-    // What does not lead to the emulator is refused, and the stored path kept.
-    // The third is a folder named like the emulator, holding another such folder.
-    const QString refused[] = {fake.root() + "/missing", fake.makeFolder("empty"),
+    // What does not lead to a program is refused, and the stored path kept; a file that
+    // cannot be run is named. The third is a folder named like the emulator, holding
+    // another such folder; the last a z26 without its execute permission.
+    const QString refused[] = {fake.root() + "/missing",
+                               fake.makeFolder("empty"),
                                fake.makeFolder("trap/z26/z26").chopped(4),
                                fake.writeFile("notes.txt", "hello"),
-                               fake.root() + "/bad\nname\x01/z26"};
+                               fake.root() + "/bad\nname\x01/z26",
+                               fake.writeFile("plain/z26")};
     for (const QString& path : refused)
         drop(box, {QUrl::fromLocalFile(path)});
-    EXPECT_EQ(boxLines(fake.dialogs),
-              Lines(std::size(refused), "Non-z26 Folder Chosen. | z26 doesn't "
-                                        "exist in that path. \nChoose another one. | Ok | None"));
+    const std::string none = "Non-z26 Folder Chosen. | z26 doesn't exist in that path. \nChoose "
+                             "another one. | Ok | None";
+    const auto noProgram = [](const QString& path) {
+        return "Not a Program | " + path.toStdString() +
+               " is not a program lum can start.\nChoose the z26 program. | Ok | Exclamation";
+    };
+    EXPECT_EQ(boxLines(fake.dialogs), (Lines{none, none, noProgram(refused[2] + "/z26"),
+                                             noProgram(refused[3]), none, noProgram(refused[5])}));
     EXPECT_EQ(box->text(), upper);
     EXPECT_EQ(stored("Z26Path"), upper);
 }
