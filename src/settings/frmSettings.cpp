@@ -320,6 +320,15 @@ void frmSettings::addRomRow(const QString& path, bool bEnabled) {
     row->setToolTip(0, QDir::toNativeSeparators(path));
     row->setTextAlignment(1, Qt::AlignRight | Qt::AlignVCenter);
     row->setCheckState(0, bEnabled ? Qt::Checked : Qt::Unchecked);
+    // A folder not found (on a disk not plugged in, say) keeps its row, entry and flag
+    // until the user removes it; it shows greyed with no files.
+    if (!QFileInfo(path).isDir()) {
+        for (const int column : {0, 1}) {
+            row->setForeground(column, palette().brush(QPalette::Disabled, QPalette::Text));
+            row->setToolTip(column, QStringLiteral("Folder not found"));
+        }
+        row->setText(1, QStringLiteral("0"));
+    }
 }
 
 void frmSettings::recountRomRows() {
@@ -353,7 +362,7 @@ void frmSettings::LoadDefaultPaths() {
     }
     // The stored flags come back with the rows; a reload that cleared them would make the
     // next save disable every folder.
-    for (const RomFolder& folder : loadExistingRomFolders(m_platform.store))
+    for (const RomFolder& folder : readRomFolders(m_platform.store))
         addRomRow(folder.path, folder.enabled);
     // Counts every row with the page's pattern.
     txtDefPathFilter_Change();
@@ -393,6 +402,17 @@ void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
         m_platform.dialogs.MsgBox(this, QStringLiteral(".rar files aren't supported yet"),
                                   MsgButtons::Ok, MsgIcon::None);
     } else if (!path.isEmpty() && QFileInfo(path).isDir()) {
+        const QTreeWidget* rows = m_ui->vbalListDefPaths;
+        for (int i = 0; i < rows->topLevelItemCount(); ++i) {
+            const QString listed = rows->topLevelItem(i)->text(0);
+            if (sameFolder(listed, path)) {
+                m_platform.dialogs.MsgBox(this,
+                                          QDir::toNativeSeparators(listed) +
+                                              QStringLiteral(" is already in the list."),
+                                          MsgButtons::Ok, MsgIcon::Information);
+                return;
+            }
+        }
         // New folders are enabled; the reload below counts the files.
         addRomRow(path, true);
     } else {
