@@ -249,6 +249,15 @@ void frmSettings::Form_Unload() {
     SaveDefaultPaths();
 }
 
+void frmSettings::keyPressEvent(QKeyEvent* event) {
+    // Escape closes the window as its close box does, which only hides it.
+    if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
+        close();
+        return;
+    }
+    QWidget::keyPressEvent(event);
+}
+
 void frmSettings::resizeEvent(QResizeEvent* event) {
     QWidget::resizeEvent(event);
     Form_Resize();

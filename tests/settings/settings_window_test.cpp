@@ -58,6 +58,9 @@ TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
     EXPECT_TRUE(w->isHidden());
     EXPECT_EQ(stored("top", "setpos"), "1500");
     w->show();
+    QTest::keyClick(control<QCheckBox>(*w, "chkBW"), Qt::Key_Escape); // as the close box
+    EXPECT_TRUE(w->isHidden());
+    w->show();
     EXPECT_EQ(w->options().blackAndWhite, Check::On);
 
     // Unload saves the place and the folder list, whose save ends it after the first.
