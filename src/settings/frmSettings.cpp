@@ -170,8 +170,9 @@ void frmSettings::placeTabControl() {
     const int tabHeight = std::max(twips::toPixelsY(kTabHeightTwips), content.height());
     const int stripWidth = twips::toPixelsX(kSideStripWidthTwips);
     m_ui->vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
-    // The pages are laid out for this size, so the window keeps it.
-    setFixedSize(stripWidth + tabWidth + twips::toPixelsX(100), tabHeight + twips::toPixelsY(500));
+    // The pages are laid out for this size, so the window keeps it. Qt's size is the inner
+    // one, without the title bar and borders that a stored Windows size counts in.
+    setFixedSize(stripWidth + tabWidth, tabHeight);
     m_ui->picSideText->setGeometry(0, 0, stripWidth, height());
 }
 
