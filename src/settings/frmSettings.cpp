@@ -6,6 +6,7 @@
 #include "settings/DefaultPaths.h"
 #include "ui/OleColor.h"
 #include "ui/PictureBox.h"
+#include "ui/ScreenPlace.h"
 #include "ui/Twips.h"
 #include "ui/cTextBoxXP.h"
 
@@ -147,9 +148,6 @@ void frmSettings::Form_Load() {
     m_logo.setStartColor(0);
     m_logo.setEndColor(kOleButtonFace);
 
-    const WindowPlace place = read(m_platform.store, stored::settingsWindow);
-    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
-
     QTabWidget* tabs = m_ui->vbalDTabControl1;
     for (size_t i = 0; i < std::size(kTabs); ++i) {
         const int index = tabs->addTab(m_ui->pages[i], style()->standardIcon(kTabs[i].icon),
@@ -157,6 +155,9 @@ void frmSettings::Form_Load() {
         tabs->tabBar()->setTabData(index, QLatin1String(kTabs[i].key));
     }
     placeTabControl();
+    const WindowPlace place = read(m_platform.store, stored::settingsWindow);
+    m_place = placeOnScreen(
+        *this, QRect(twips::toPixelsX(place.left), twips::toPixelsY(place.top), width(), height()));
 
     LoadDefaultPaths();
 }
@@ -245,8 +246,11 @@ void frmSettings::closeEvent(QCloseEvent* event) {
 }
 
 void frmSettings::Form_Unload() {
-    write(m_platform.store, stored::settingsWindow,
-          WindowPlace{twips::fromPixelsY(y()), twips::fromPixelsX(x())});
+    // A place moved onto a screen here is kept out of the store until the user moves the
+    // window, so the stored one still holds when its screen is back.
+    if (placeChangedByUser(*this, m_place))
+        write(m_platform.store, stored::settingsWindow,
+              WindowPlace{twips::fromPixelsY(y()), twips::fromPixelsX(x())});
     SaveDefaultPaths();
 }
 

@@ -2,6 +2,7 @@
 
 #include "emulator/EmulatorOptions.h"
 #include "library/FileLister.h"
+#include "ui/ScreenPlace.h"
 #include "ui/cLogo.h"
 
 #include <QImage>
@@ -169,6 +170,7 @@ private:
     FileLister FileROM;
     bool m_bCountsPending = false; // the folder counts wait for the window to show
     bool m_bUnloading = false;
+    ScreenFit m_place; // where the stored place opened the window
     // Created by the first picture button click; it deletes itself when closed.
     QPointer<frmPicPreview> m_picPreview;
 };

@@ -68,4 +68,11 @@ TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
     EXPECT_TRUE(w->isHidden());
     EXPECT_EQ(stored("ROM2Path"), "");
     EXPECT_EQ(open()->pos(), QPoint(twips::toPixelsX(2400), twips::toPixelsY(1200)));
+
+    // A place off every screen opens on one, and stays stored until the user moves it.
+    fake.store.SaveSetting("setpos", "left", "-90000");
+    auto off = open();
+    EXPECT_TRUE(off->screen()->availableGeometry().contains(QRect(off->pos(), off->size())));
+    off->Unload();
+    EXPECT_EQ(stored("left", "setpos"), "-90000");
 }
