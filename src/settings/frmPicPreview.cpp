@@ -30,6 +30,7 @@ frmPicPreview::frmPicPreview(Platform& platform, QWidget* owner)
 
     Label1 = new QLabel(this);
     Label1->setObjectName(QStringLiteral("Label1"));
+    Label1->setTextFormat(Qt::PlainText);
     Label1->hide();
 
     if (owner)

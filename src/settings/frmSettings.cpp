@@ -28,6 +28,7 @@
 #include <QStyle>
 #include <QTabBar>
 #include <QTabWidget>
+#include <QTextDocument>
 #include <QTreeWidget>
 #include <QUrl>
 
@@ -331,7 +332,7 @@ void frmSettings::addRomRow(const QString& path, bool bEnabled) {
     auto* row = new QTreeWidgetItem(m_ui->vbalListDefPaths);
     row->setFlags(row->flags() | Qt::ItemIsUserCheckable);
     row->setText(0, path);
-    row->setToolTip(0, QDir::toNativeSeparators(path));
+    row->setToolTip(0, Qt::convertFromPlainText(QDir::toNativeSeparators(path)));
     row->setTextAlignment(1, Qt::AlignRight | Qt::AlignVCenter);
     row->setCheckState(0, bEnabled ? Qt::Checked : Qt::Unchecked);
     // A folder not found (on a disk not plugged in, say) keeps its row, entry and flag

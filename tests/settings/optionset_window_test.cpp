@@ -37,6 +37,7 @@ TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     EXPECT_EQ(requestLines(fake.dialogs),
               (Lines{"save" + chooser + "2", "open" + chooser + "1800"}));
     EXPECT_TRUE(QFileInfo(fake.platform.userFolder).isDir());
+    EXPECT_EQ(control<QLabel>(*w, "lblConfig")->textFormat(), Qt::PlainText); // names as typed
 
     // The name as chosen in the status line; ".lum" added unless the name ends in it.
     control<QRadioButton>(*w, "optCPPAL")->click();
