@@ -7,6 +7,7 @@
 #include <QSaveFile>
 #include <QtEndian>
 
+#include <algorithm>
 #include <cmath>
 #include <cstring>
 #include <limits>
@@ -171,7 +172,24 @@ std::optional<SliderScale> soundQueueScaleFor(float stored) {
     // would refuse a value outside its range.
     if (!min || !max || !value || *value < *min || *value > *max)
         return std::nullopt;
-    return SliderScale{*min, *max, *value};
+    // A set of one or two digits re-centres below 1, where the bar must not go: z26 takes
+    // no queue of 0 or less.
+    return soundQueueOnScale(*min, *max, *value);
+}
+
+SliderScale soundQueueOnScale(qint64 min, qint64 max, qint64 value) {
+    constexpr qint64 kTopWindowMin = 65339;
+    constexpr qint64 kBottomWindowMax = 201;
+    if (max > kSoundQueueHighest) {
+        max = kSoundQueueHighest;
+        min = kTopWindowMin;
+    }
+    if (min < kSoundQueueLowest) {
+        min = kSoundQueueLowest;
+        max = kBottomWindowMax;
+    }
+    return {static_cast<int>(min), static_cast<int>(max),
+            static_cast<int>(std::clamp(value, min, max))};
 }
 
 QString withLumExtension(const QString& path) {
@@ -180,18 +198,19 @@ QString withLumExtension(const QString& path) {
     return path + QStringLiteral(".lum");
 }
 
-bool writeOptionFile(const QString& path, const EmulatorOptions& options) {
+bool writeOptionFile(const QString& path, const EmulatorOptions& options, QString* whyNot) {
     const QByteArray bytes = encodeOptions(options);
     QSaveFile file(path);
     // Unbuffered, so a short write (a full disk) shows here: a buffered one is flushed by
     // commit(), which does not notice it and would put a cut-off file in place.
-    if (!file.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
-        return false;
-    if (file.write(bytes) != bytes.size()) {
+    const bool bWritten = file.open(QIODevice::WriteOnly | QIODevice::Unbuffered) &&
+                          file.write(bytes) == bytes.size() && file.commit();
+    if (!bWritten) {
+        if (whyNot)
+            *whyNot = file.errorString();
         file.cancelWriting();
-        return false;
     }
-    return file.commit();
+    return bWritten;
 }
 
 OptionSetRead readOptionFile(const QString& path, const EmulatorOptions& base) {
@@ -200,21 +219,27 @@ OptionSetRead readOptionFile(const QString& path, const EmulatorOptions& base) {
     unreadable.options = base;
 
     // Only regular files: a folder cannot be read and a pipe or device could block.
-    if (!QFileInfo(path).isFile())
+    const QFileInfo info(path);
+    if (!info.isFile()) {
+        unreadable.error = info.exists() ? QStringLiteral("It is not a file.")
+                                         : QStringLiteral("No such file or directory");
         return unreadable;
+    }
     QFile file(path);
-    if (!file.open(QIODevice::ReadOnly))
-        return unreadable;
     QByteArray bytes;
     bytes.reserve(kOptionSetSize);
-    // read() may return less than asked for before the end, so read until full or done.
-    while (bytes.size() < kOptionSetSize) {
-        const QByteArray chunk = file.read(kOptionSetSize - bytes.size());
-        if (chunk.isEmpty())
-            break;
-        bytes += chunk;
+    if (file.open(QIODevice::ReadOnly)) {
+        // read() may return less than asked for before the end, so read until full or done.
+        while (bytes.size() < kOptionSetSize) {
+            const QByteArray chunk = file.read(kOptionSetSize - bytes.size());
+            if (chunk.isEmpty())
+                break;
+            bytes += chunk;
+        }
     }
-    if (file.error() != QFileDevice::NoError)
+    if (file.error() != QFileDevice::NoError) {
+        unreadable.error = file.errorString();
         return unreadable;
+    }
     return decodeOptions(bytes, base);
 }

@@ -25,6 +25,8 @@ struct OptionSetRead {
     EmulatorOptions options;
     // The row of optionTable() that could not be applied, or -1.
     int firstBad = -1;
+    // Why an Unreadable set could not be read, in the system's words where it gave some.
+    QString error;
 
     bool ok() const { return status == Status::Ok; }
 };
@@ -43,8 +45,9 @@ QString withLumExtension(const QString& path);
 
 // Writes the set as the whole file. The bytes go to a temporary file in the same folder
 // that is renamed into place, so a failure leaves any older file as it was and no
-// half-written one. False when the file could not be written.
-bool writeOptionFile(const QString& path, const EmulatorOptions& options);
+// half-written one. False when the file could not be written, with the reason in `whyNot`.
+bool writeOptionFile(const QString& path, const EmulatorOptions& options,
+                     QString* whyNot = nullptr);
 
 // Reads a set and applies it to `base`. A path that is not a regular file or cannot be
 // read is Unreadable and applies nothing.
@@ -58,8 +61,17 @@ struct SliderScale {
     bool operator==(const SliderScale&) const = default;
 };
 
+// The sound queue's whole scale, of which its bar shows a window 200 wide; z26 takes no
+// queue outside it.
+inline constexpr int kSoundQueueLowest = 1;
+inline constexpr int kSoundQueueHighest = 65536;
+
+// The window held on the scale (1..201 at the bottom, 65339..65536 at the top: a window of
+// 197 there), then the value held in the window.
+SliderScale soundQueueOnScale(qint64 min, qint64 max, qint64 value);
+
 // The sound queue's bar as a stored value shows it: the range re-centred on the value's
-// hundreds (the decimal text without its last two digits), then the value. Empty when the
-// value cannot be shown that way (not a whole number within the range it makes, or beyond
-// the bar's 32-bit range).
+// hundreds (the decimal text without its last two digits), then the value, both held on the
+// scale as above. Empty when the value cannot be shown that way (not a whole number within
+// the range it makes, or beyond the bar's 32-bit range).
 std::optional<SliderScale> soundQueueScaleFor(float stored);

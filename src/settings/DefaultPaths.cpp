@@ -1,5 +1,6 @@
 #include "settings/DefaultPaths.h"
 
+#include <QDir>
 #include <QFileInfo>
 
 namespace {
@@ -17,13 +18,9 @@ QString withoutTrailingSeparators(QString path) {
 
 } // namespace
 
-std::vector<RomFolder> loadExistingRomFolders(SettingsStore& store) {
-    std::vector<RomFolder> folders = readRomFolders(store);
-    const auto vanished = std::erase_if(
-        folders, [](const RomFolder& folder) { return !QFileInfo(folder.path).isDir(); });
-    if (vanished > 0)
-        writeRomFolders(store, folders);
-    return folders;
+bool sameFolder(const QString& a, const QString& b) {
+    return QDir::cleanPath(QFileInfo(a).absoluteFilePath()) ==
+           QDir::cleanPath(QFileInfo(b).absoluteFilePath());
 }
 
 bool isArchiveName(const QString& item) {

@@ -1,18 +1,12 @@
 #pragma once
 
-#include "platform/StoredSettings.h"
-
 #include <QString>
 
-#include <vector>
+// The rules of the Default Paths page that need no window: which folders are the same, and
+// how the emulator's path is completed.
 
-// The rules of the Default Paths page that need no window: which stored folders are kept,
-// and how the emulator's path is completed.
-
-// The stored entries whose folders still exist. When some have vanished from disk the
-// store is rewritten without them at once, so the folders stored after a vanished one
-// stay reachable for the main list.
-std::vector<RomFolder> loadExistingRomFolders(SettingsStore& store);
+// True when both paths name one folder: their cleaned absolute forms are equal.
+bool sameFolder(const QString& a, const QString& b);
 
 // True when a dropped item's name marks an archive: longer than four characters and
 // ending in ".rar" in any letter case.

@@ -1,16 +1,11 @@
 #include "settings/SliderRules.h"
 
-#include <algorithm>
-
 namespace sliders {
 
 namespace {
 
 // A shifted value lands this far inside the window's near edge.
 constexpr qint64 kLandingInset = 5;
-// The lowest window is a full 200 wide; the highest only 197, ending at the scale's top.
-constexpr qint64 kLowestWindowMax = 201;
-constexpr qint64 kHighestWindowMin = 65339;
 
 } // namespace
 
@@ -36,22 +31,12 @@ Scale ShiftSoundQueue(const Scale& scale, int keyAscii) {
 
     // Hold the window inside the scale before looking at the value, so that a shift which
     // cannot move the window cannot move the value either.
-    if (hi > kSoundQueueHighest) {
-        hi = kSoundQueueHighest;
-        lo = kHighestWindowMin;
-    }
-    if (lo < kSoundQueueLowest) {
-        lo = kSoundQueueLowest;
-        hi = kLowestWindowMax;
-    }
-
-    if (down && value > hi)
-        value = hi - kLandingInset;
-    if (up && value < lo)
-        value = lo + kLandingInset;
-    value = std::clamp<qint64>(value, kSoundQueueLowest, kSoundQueueHighest);
-
-    return {static_cast<int>(lo), static_cast<int>(hi), static_cast<int>(value)};
+    const Scale window = soundQueueOnScale(lo, hi, lo);
+    if (down && value > window.max)
+        value = window.max - kLandingInset;
+    if (up && value < window.min)
+        value = window.min + kLandingInset;
+    return soundQueueOnScale(window.min, window.max, value);
 }
 
 QString FormatThousands(qint64 value, const QString& separator) {

@@ -18,8 +18,6 @@ inline constexpr int kPhosMax = 100;
 // Size of the sound queue: the bar shows a window of 200 of the whole scale 1..65536.
 inline constexpr int kSoundQueueDefaultMin = 4500;
 inline constexpr int kSoundQueueDefaultMax = 4700;
-inline constexpr int kSoundQueueLowest = 1;
-inline constexpr int kSoundQueueHighest = 65536;
 inline constexpr int kSoundQueueStep = 100;
 
 // The characters that shift the sound queue's scale.
@@ -34,8 +32,8 @@ Scale SoundQueueDefault();
 // The sound queue after a key press on its bar. + moves the window a step up, - a step
 // down; a value the window leaves behind lands 5 inside the window's near edge. The window
 // then stays within the scale: 1..201 at the bottom, 65339..65536 at the top. Any key,
-// also one that shifts nothing, brings the value into 1..65536. At either end of the scale
-// a shift that cannot move the window leaves the value alone.
+// also one that shifts nothing, brings the value into the window. At either end of the
+// scale a shift that cannot move the window leaves the value alone.
 Scale ShiftSoundQueue(const Scale& scale, int keyAscii);
 
 // The value grouped by thousands with separator ("#,##0"): 4608 gives "4,608" with ",".

@@ -30,14 +30,16 @@ frmPicPreview::frmPicPreview(Platform& platform, QWidget* owner)
 
     Label1 = new QLabel(this);
     Label1->setObjectName(QStringLiteral("Label1"));
+    Label1->setTextFormat(Qt::PlainText);
     Label1->hide();
 
     if (owner)
         setWindowIcon(owner->window()->windowIcon());
 
     const WindowPlace place = read(m_platform.store, stored::pictureWindow);
-    resize(std::max(1, twips::toPixelsX(place.width)), std::max(1, twips::toPixelsY(place.height)));
-    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
+    m_place = placeOnScreen(*this, QRect(twips::toPixelsX(place.left), twips::toPixelsY(place.top),
+                                         std::max(1, twips::toPixelsX(place.width)),
+                                         std::max(1, twips::toPixelsY(place.height))));
 }
 
 bool frmPicPreview::showPicture(const QString& path, const QString& caption) {
@@ -98,8 +100,9 @@ void frmPicPreview::closeEvent(QCloseEvent* event) {
 }
 
 void frmPicPreview::saveGeometryToStore() {
-    // A minimized window has no place worth keeping.
-    if (isMinimized())
+    // A minimized window has no place worth keeping, and one moved onto a screen here is
+    // kept out of the store until the user moves or resizes it.
+    if (isMinimized() || !placeChangedByUser(*this, m_place))
         return;
     write(m_platform.store, stored::pictureWindow,
           {twips::fromPixelsY(y()), twips::fromPixelsX(x()), twips::fromPixelsX(width()),

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "ui/ScreenPlace.h"
+
 #include <QWidget>
 
 struct Platform;
@@ -42,4 +44,5 @@ private:
     void saveGeometryToStore();
 
     Platform& m_platform;
+    ScreenFit m_place; // where the stored place opened the window
 };

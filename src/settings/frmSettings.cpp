@@ -6,6 +6,7 @@
 #include "settings/DefaultPaths.h"
 #include "ui/OleColor.h"
 #include "ui/PictureBox.h"
+#include "ui/ScreenPlace.h"
 #include "ui/Twips.h"
 #include "ui/cTextBoxXP.h"
 
@@ -27,6 +28,7 @@
 #include <QStyle>
 #include <QTabBar>
 #include <QTabWidget>
+#include <QTextDocument>
 #include <QTreeWidget>
 #include <QUrl>
 
@@ -147,9 +149,6 @@ void frmSettings::Form_Load() {
     m_logo.setStartColor(0);
     m_logo.setEndColor(kOleButtonFace);
 
-    const WindowPlace place = read(m_platform.store, stored::settingsWindow);
-    move(twips::toPixelsX(place.left), twips::toPixelsY(place.top));
-
     QTabWidget* tabs = m_ui->vbalDTabControl1;
     for (size_t i = 0; i < std::size(kTabs); ++i) {
         const int index = tabs->addTab(m_ui->pages[i], style()->standardIcon(kTabs[i].icon),
@@ -157,6 +156,9 @@ void frmSettings::Form_Load() {
         tabs->tabBar()->setTabData(index, QLatin1String(kTabs[i].key));
     }
     placeTabControl();
+    const WindowPlace place = read(m_platform.store, stored::settingsWindow);
+    m_place = placeOnScreen(
+        *this, QRect(twips::toPixelsX(place.left), twips::toPixelsY(place.top), width(), height()));
 
     LoadDefaultPaths();
 }
@@ -170,8 +172,9 @@ void frmSettings::placeTabControl() {
     const int tabHeight = std::max(twips::toPixelsY(kTabHeightTwips), content.height());
     const int stripWidth = twips::toPixelsX(kSideStripWidthTwips);
     m_ui->vbalDTabControl1->setGeometry(stripWidth, 0, tabWidth, tabHeight);
-    // The pages are laid out for this size, so the window keeps it.
-    setFixedSize(stripWidth + tabWidth + twips::toPixelsX(100), tabHeight + twips::toPixelsY(500));
+    // The pages are laid out for this size, so the window keeps it. Qt's size is the inner
+    // one, without the title bar and borders that a stored Windows size counts in.
+    setFixedSize(stripWidth + tabWidth, tabHeight);
     m_ui->picSideText->setGeometry(0, 0, stripWidth, height());
 }
 
@@ -244,9 +247,21 @@ void frmSettings::closeEvent(QCloseEvent* event) {
 }
 
 void frmSettings::Form_Unload() {
-    write(m_platform.store, stored::settingsWindow,
-          WindowPlace{twips::fromPixelsY(y()), twips::fromPixelsX(x())});
+    // A place moved onto a screen here is kept out of the store until the user moves the
+    // window, so the stored one still holds when its screen is back.
+    if (placeChangedByUser(*this, m_place))
+        write(m_platform.store, stored::settingsWindow,
+              WindowPlace{twips::fromPixelsY(y()), twips::fromPixelsX(x())});
     SaveDefaultPaths();
+}
+
+void frmSettings::keyPressEvent(QKeyEvent* event) {
+    // Escape closes the window as its close box does, which only hides it.
+    if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
+        close();
+        return;
+    }
+    QWidget::keyPressEvent(event);
 }
 
 void frmSettings::resizeEvent(QResizeEvent* event) {
@@ -317,9 +332,18 @@ void frmSettings::addRomRow(const QString& path, bool bEnabled) {
     auto* row = new QTreeWidgetItem(m_ui->vbalListDefPaths);
     row->setFlags(row->flags() | Qt::ItemIsUserCheckable);
     row->setText(0, path);
-    row->setToolTip(0, QDir::toNativeSeparators(path));
+    row->setToolTip(0, Qt::convertFromPlainText(QDir::toNativeSeparators(path)));
     row->setTextAlignment(1, Qt::AlignRight | Qt::AlignVCenter);
     row->setCheckState(0, bEnabled ? Qt::Checked : Qt::Unchecked);
+    // A folder not found (on a disk not plugged in, say) keeps its row, entry and flag
+    // until the user removes it; it shows greyed with no files.
+    if (!QFileInfo(path).isDir()) {
+        for (const int column : {0, 1}) {
+            row->setForeground(column, palette().brush(QPalette::Disabled, QPalette::Text));
+            row->setToolTip(column, QStringLiteral("Folder not found"));
+        }
+        row->setText(1, QStringLiteral("0"));
+    }
 }
 
 void frmSettings::recountRomRows() {
@@ -353,7 +377,7 @@ void frmSettings::LoadDefaultPaths() {
     }
     // The stored flags come back with the rows; a reload that cleared them would make the
     // next save disable every folder.
-    for (const RomFolder& folder : loadExistingRomFolders(m_platform.store))
+    for (const RomFolder& folder : readRomFolders(m_platform.store))
         addRomRow(folder.path, folder.enabled);
     // Counts every row with the page's pattern.
     txtDefPathFilter_Change();
@@ -393,6 +417,17 @@ void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
         m_platform.dialogs.MsgBox(this, QStringLiteral(".rar files aren't supported yet"),
                                   MsgButtons::Ok, MsgIcon::None);
     } else if (!path.isEmpty() && QFileInfo(path).isDir()) {
+        const QTreeWidget* rows = m_ui->vbalListDefPaths;
+        for (int i = 0; i < rows->topLevelItemCount(); ++i) {
+            const QString listed = rows->topLevelItem(i)->text(0);
+            if (sameFolder(listed, path)) {
+                m_platform.dialogs.MsgBox(this,
+                                          QDir::toNativeSeparators(listed) +
+                                              QStringLiteral(" is already in the list."),
+                                          MsgButtons::Ok, MsgIcon::Information);
+                return;
+            }
+        }
         // New folders are enabled; the reload below counts the files.
         addRomRow(path, true);
     } else {
@@ -406,9 +441,20 @@ void frmSettings::AddRomFolder(const QString& path, bool bArchive) {
 
 void frmSettings::SetZ26Path(const QString& path) {
     const QString executable = completeZ26Path(path);
-    if (QFileInfo(executable).isFile()) {
+    const QFileInfo found(executable);
+    if (found.isFile() && found.isExecutable()) {
         m_ui->txtDefPathz26->setText(executable);
         write(m_platform.store, stored::z26Path, executable);
+        return;
+    }
+    // A file that is there but cannot be run (a text file, a z26 without its execute
+    // permission, a folder named z26) is named, so the user sees which one was refused.
+    if (found.exists() || QFileInfo(path).isFile()) {
+        m_platform.dialogs.MsgBox(
+            this,
+            QDir::toNativeSeparators(found.exists() ? executable : path) +
+                QStringLiteral(" is not a program lum can start.\nChoose the z26 program."),
+            MsgButtons::Ok, MsgIcon::Exclamation, QStringLiteral("Not a Program"));
         return;
     }
     m_platform.dialogs.MsgBox(

@@ -2,6 +2,7 @@
 
 #include "emulator/EmulatorOptions.h"
 #include "library/FileLister.h"
+#include "ui/ScreenPlace.h"
 #include "ui/cLogo.h"
 
 #include <QImage>
@@ -61,12 +62,15 @@ public:
     void editSwitches();
 
     // Option sets (.lum files). LoadSettings shows the set's options and returns false,
-    // after saying so, when the file is corrupt; the two buttons (also the main window's
-    // File menu) ask for a file and report in the status line.
+    // after saying so, when the file is corrupt; the two buttons ask for a file and report
+    // in the status line. The main window's File menu does the same, and says a failure in
+    // a message box too, naming the file and why, as this window may be out of sight.
     bool LoadSettings(const QString& path);
     bool LoadSettings(const OptionSetRead& optionSet);
     void cmdSaveDat_Click();
     void cmdLoadDat_Click();
+    void saveOptionSetFromMenu();
+    void loadOptionSetFromMenu();
     // The status line of the Save/Load frame and its tool tip.
     void showConfigStatus(const QString& text, const QString& tip);
 
@@ -95,6 +99,7 @@ signals:
 
 protected:
     void closeEvent(QCloseEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void showEvent(QShowEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
@@ -128,7 +133,10 @@ private:
     bool numberFieldEvent(QObject* watched, QEvent* event);
     void comboVideoMode_Click();
     void chkDOSSwitch_Click();
-    bool reportCorruptOptionSet();
+    void saveOptionSet(bool bFromMenu);
+    void loadOptionSet(bool bFromMenu);
+    // The corrupt-set box: the fixed words, or `why` when it is given.
+    bool reportCorruptOptionSet(const QString& why);
     void showControlPic(bool bLeft);
 
     // Slider bars.
@@ -162,6 +170,7 @@ private:
     FileLister FileROM;
     bool m_bCountsPending = false; // the folder counts wait for the window to show
     bool m_bUnloading = false;
+    ScreenFit m_place; // where the stored place opened the window
     // Created by the first picture button click; it deletes itself when closed.
     QPointer<frmPicPreview> m_picPreview;
 };

@@ -15,6 +15,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QCoreApplication>
+#include <QDir>
 #include <QEvent>
 #include <QFileInfo>
 #include <QFocusEvent>
@@ -58,15 +59,28 @@ void showFrame(QWidget* frame, bool bOn) {
     frame->setEnabled(bOn);
 }
 
-// The option-set chooser of both buttons, opening in the program folder.
-FileDialogRequest optionSetRequest(const QString& programFolder, unsigned flags) {
+// The option-set chooser of both buttons. It opens in the user's own folder, made if need
+// be, where a Default.lum saved becomes the options lum starts with.
+FileDialogRequest optionSetRequest(const QString& userFolder, unsigned flags) {
+    QDir().mkpath(userFolder);
     FileDialogRequest request;
     request.title = kDialogTitle;
     request.filter = kDialogFilter;
     request.filterIndex = 1;
-    request.initialFolder = programFolder;
+    request.initialFolder = userFolder;
     request.flags = flags;
     return request;
+}
+
+// What the menu's Load says when a set could not be loaded: the file and why.
+QString loadFailure(const QString& path, const OptionSetRead& read) {
+    QString why = read.error;
+    if (read.status == OptionSetRead::Status::Short)
+        why = QStringLiteral("It is too short to be a lum settings file.");
+    else if (read.status == OptionSetRead::Status::Invalid)
+        why = QStringLiteral("It holds a value lum cannot use, so it is corrupt. The settings "
+                             "before that value were loaded; please verify them and re-save.");
+    return QStringLiteral("%1 could not be loaded:\n%2").arg(QDir::toNativeSeparators(path), why);
 }
 
 } // namespace
@@ -224,15 +238,18 @@ bool frmSettings::LoadSettings(const OptionSetRead& optionSet) {
     // A file that cannot be read or is too short applies nothing; one with a value the
     // window cannot show applies every option before that one.
     setOptions(optionSet.options);
-    return optionSet.ok() || reportCorruptOptionSet();
+    return optionSet.ok() || reportCorruptOptionSet(QString());
 }
 
-bool frmSettings::reportCorruptOptionSet() {
-    m_platform.dialogs.MsgBox(this,
-                              QStringLiteral(".lum file is corrupt\r\n"
-                                             "Please verify settings and re-save to correct "
-                                             "this problem"),
-                              MsgButtons::Ok, MsgIcon::None);
+bool frmSettings::reportCorruptOptionSet(const QString& why) {
+    if (why.isEmpty())
+        m_platform.dialogs.MsgBox(this,
+                                  QStringLiteral(".lum file is corrupt\r\n"
+                                                 "Please verify settings and re-save to correct "
+                                                 "this problem"),
+                                  MsgButtons::Ok, MsgIcon::None);
+    else
+        m_platform.dialogs.MsgBox(this, why, MsgButtons::Ok, MsgIcon::Exclamation);
     show();
     selectPage(QStringLiteral("Settings"));
     return false;
@@ -244,8 +261,24 @@ void frmSettings::showConfigStatus(const QString& text, const QString& tip) {
 }
 
 void frmSettings::cmdSaveDat_Click() {
+    saveOptionSet(false);
+}
+
+void frmSettings::saveOptionSetFromMenu() {
+    saveOptionSet(true);
+}
+
+void frmSettings::cmdLoadDat_Click() {
+    loadOptionSet(false);
+}
+
+void frmSettings::loadOptionSetFromMenu() {
+    loadOptionSet(true);
+}
+
+void frmSettings::saveOptionSet(bool bFromMenu) {
     const QString chosen = m_platform.dialogs.ShowSave(
-        this, optionSetRequest(m_platform.programFolder, kFlagOverwritePrompt));
+        this, optionSetRequest(m_platform.userFolder, kFlagOverwritePrompt));
     if (chosen.isEmpty())
         return;
 
@@ -263,19 +296,30 @@ void frmSettings::cmdSaveDat_Click() {
 
     // Whether the write worked, not whether some file of that name exists: a failed save
     // over an older file must not report success.
-    showConfigStatus(writeOptionFile(path, m_options)
-                         ? fileTitle + QStringLiteral(" was succesfully saved")
-                         : QStringLiteral("error saving ") + fileTitle,
+    QString whyNot;
+    const bool bSaved = writeOptionFile(path, m_options, &whyNot);
+    showConfigStatus(bSaved ? fileTitle + QStringLiteral(" was succesfully saved")
+                            : QStringLiteral("error saving ") + fileTitle,
                      QString());
+    // From the main window's menu the status line may be out of sight.
+    if (!bSaved && bFromMenu)
+        m_platform.dialogs.MsgBox(this,
+                                  QStringLiteral("%1 could not be saved:\n%2")
+                                      .arg(QDir::toNativeSeparators(path), whyNot),
+                                  MsgButtons::Ok, MsgIcon::Exclamation);
 }
 
-void frmSettings::cmdLoadDat_Click() {
+void frmSettings::loadOptionSet(bool bFromMenu) {
     const QString path = m_platform.dialogs.ShowOpen(
-        this, optionSetRequest(m_platform.programFolder, kFlagPathMustExist | kFlagFileMustExist));
+        this, optionSetRequest(m_platform.userFolder, kFlagPathMustExist | kFlagFileMustExist));
     if (path.isEmpty())
         return;
 
-    const bool bLoaded = LoadSettings(path);
+    const OptionSetRead optionSet = readOptionFile(path, m_options);
+    setOptions(optionSet.options);
+    const bool bLoaded =
+        optionSet.ok() ||
+        reportCorruptOptionSet(bFromMenu ? loadFailure(path, optionSet) : QString());
     QCoreApplication::processEvents();
     const QString fileTitle = QFileInfo(path).fileName();
     showConfigStatus(bLoaded ? fileTitle + QStringLiteral(" was succesfully loaded")

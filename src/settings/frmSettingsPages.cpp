@@ -105,6 +105,8 @@ void frmSettings::createSettingsPage() {
     connect(cmdLoadDat, &QPushButton::clicked, this, &frmSettings::cmdLoadDat_Click);
     m_ui->lblConfig = named(new QLabel, "lblConfig");
     m_ui->lblConfig->setWordWrap(true);
+    // It names files, which show as they are called, never as markup.
+    m_ui->lblConfig->setTextFormat(Qt::PlainText);
     auto* config = tight(new QHBoxLayout(fraConfig), 8);
     config->addWidget(cmdSaveDat);
     config->addWidget(cmdLoadDat);

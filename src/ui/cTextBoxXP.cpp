@@ -4,10 +4,13 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
+#include <QScreen>
 #include <QStyle>
 #include <QTimer>
 #include <QToolTip>
 #include <QVBoxLayout>
+
+#include <algorithm>
 
 namespace {
 
@@ -62,8 +65,15 @@ BalloonTip::BalloonTip(QWidget* anchor, int icon, const QString& title, const QS
     outer->addLayout(column);
 
     adjustSize();
-    // Under the control, starting a little in from its left edge.
-    move(anchor->mapToGlobal(QPoint(std::min(16, anchor->width() / 2), anchor->height())));
+    // Under the control, starting a little in from its left edge; above it where the screen
+    // ends below, and always whole on the screen's free area.
+    QPoint at = anchor->mapToGlobal(QPoint(std::min(16, anchor->width() / 2), anchor->height()));
+    const QRect area = anchor->screen()->availableGeometry();
+    if (at.y() + height() > area.bottom() + 1)
+        at.setY(anchor->mapToGlobal(QPoint()).y() - height());
+    at.setX(std::clamp(at.x(), area.left(), std::max(area.left(), area.right() + 1 - width())));
+    at.setY(std::clamp(at.y(), area.top(), std::max(area.top(), area.bottom() + 1 - height())));
+    move(at);
     QTimer::singleShot(kShownMilliseconds, this, &QWidget::close);
 }
 

@@ -149,11 +149,11 @@ TEST(OptionSet, SoundQueueRangeIsCentredOnTheStoredHundreds) {
         std::optional<SliderScale> scale;
     } cases[] = {
         {4608, SliderScale{4500, 4700, 4608}},
-        {50, SliderScale{-100, 100, 50}},
-        {150, SliderScale{0, 200, 150}},
-        {-5, SliderScale{-100, 100, -5}},
-        {-0.75f, SliderScale{-100, 100, -1}},
-        {5, SliderScale{-100, 100, 5}}, // one digit: what a save of the lowest window gives
+        // Re-centred off the scale: the end window the keys reach, the value held in it.
+        {50, SliderScale{1, 201, 50}},
+        {-0.75f, SliderScale{1, 201, 1}},
+        {5, SliderScale{1, 201, 5}}, // one digit: what a save of the lowest window gives
+        {65599, SliderScale{65339, 65536, 65536}},
         // A fraction: the hundreds do not frame the value (12 lies outside 1100 to 1300).
         {12.5f, std::nullopt},
         {3839.625f, std::nullopt},

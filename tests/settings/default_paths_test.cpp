@@ -1,5 +1,6 @@
 #include "SettingsFixture.h"
 
+#include "platform/StoredSettings.h"
 #include "settings/DefaultPaths.h"
 
 #include <QDir>
@@ -59,37 +60,45 @@ TEST(DefaultPathsRules, ArchiveNamesAndTheEmulatorsPath) {
         EXPECT_EQ(z26PathForDisplay(QString::fromUtf8(text)), QString::fromUtf8(expected)) << text;
 }
 
-// Counting lists every folder, so a window still hidden counts when it is shown.
-TEST_F(DefaultPaths, ThePageCountsExistingFoldersWithThePatternAndReloadsOnItsTab) {
+// Counting lists every folder, so a window still hidden counts when it is shown. A folder
+// not found (its disk unplugged, say) shows greyed and keeps its entry and flag.
+TEST_F(DefaultPaths, ThePageCountsFoldersWithThePatternKeepsMissingOnesAndReloadsOnItsTab) {
     fake.store.SaveSetting("Settings", "ROMFilter", "*.a26");
     const QString a = romFolder("a", {"x.a26", "y.a26", "z.bin"});
     const QString b = romFolder("b with blank", {"1.bin"});
+    const QString gone = fake.root() + "/gone";
+    const QString file = fake.writeFile("file.bin"); // a file where a folder belongs
     storeFolder(1, a, false);
-    storeFolder(2, fake.root() + "/gone", true);
-    storeFolder(3, fake.writeFile("file.bin"), true); // a file where a folder belongs
+    storeFolder(2, gone, true);
+    storeFolder(3, file, true);
     storeFolder(4, b, true);
+    const std::vector<RomFolder> all = readRomFolders(fake.store);
     auto w = std::make_unique<frmSettings>(fake.platform);
-    EXPECT_EQ(rows(*w), QStringList({a + "  off", b + "  on"}));
-    // Folders gone from disk leave the store at once, so the main list still reaches b.
-    EXPECT_EQ(readRomFolders(*fake.reopenStore()), (std::vector<RomFolder>{{a, false}, {b, true}}));
+    EXPECT_EQ(rows(*w), QStringList({a + "  off", gone + " 0 on", file + " 0 on", b + "  on"}));
     w->show();
-    EXPECT_EQ(rows(*w), QStringList({a + " 2 off", b + " 0 on"}));
+    EXPECT_EQ(rows(*w), QStringList({a + " 2 off", gone + " 0 on", file + " 0 on", b + " 0 on"}));
+    const QTreeWidgetItem* missing = list(*w)->topLevelItem(1);
+    EXPECT_EQ(missing->toolTip(1), "Folder not found");
+    EXPECT_EQ(missing->foreground(0).color(),
+              w->palette().color(QPalette::Disabled, QPalette::Text));
     auto* filter = control<QLineEdit>(*w, "txtDefPathFilter");
 
     // A new pattern recounts every row and is stored at once.
     filter->selectAll();
     QTest::keyClicks(filter, "*.bin");
-    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", b + " 1 on"}));
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", gone + " 0 on", file + " 0 on", b + " 1 on"}));
     EXPECT_EQ(stored("ROMFilter"), "*.bin");
+    QTest::keyClick(list(*w), Qt::Key_F5); // saves the list and reads it back
+    EXPECT_EQ(readRomFolders(*fake.reopenStore()), all);
 
     // Choosing the page reads the store again, also by a click on the tab already shown.
     QDir(a).removeRecursively();
     w->selectPage("DefaultPaths");
-    EXPECT_EQ(rows(*w), QStringList({b + " 1 on"}));
-    storeFolder(2, romFolder("a", {"1.bin"}), true);
+    EXPECT_EQ(rows(*w)[0], a + " 0 off");
+    storeFolder(2, romFolder("c", {"1.bin"}), true);
     QTabBar* bar = control<QTabWidget>(*w, "vbalDTabControl1")->tabBar();
     QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(bar->currentIndex()).center());
-    EXPECT_EQ(rows(*w), QStringList({b + " 1 on", a + " 1 on"}));
+    EXPECT_EQ(rows(*w)[1], fake.root() + "/c 1 on");
 }
 
 TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
@@ -102,20 +111,22 @@ TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
     EXPECT_EQ(fake.dialogs.folderTitles, QStringList({"Choose ROMs path"}));
     fake.dialogs.paths = {a};
     add->trigger();
-    w->AddRomFolder(a, false); // the same folder twice: two rows, two entries
     drop(target, {QUrl::fromLocalFile(b), QUrl::fromLocalFile(a)}); // only the first counts
-    EXPECT_EQ(rows(*w), QStringList({a + " 1 on", a + " 1 on", b + " 2 on"}));
-    EXPECT_EQ(stored("ROM3Path"), b);
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 on", b + " 2 on"}));
+    EXPECT_EQ(stored("ROM2Path"), b);
 
-    // A name ending in .rar is refused as an archive, even when it is a folder.
+    // A folder in the list, however written, is not added again; a name ending in .rar is
+    // refused as an archive, even when it is a folder.
+    w->AddRomFolder(b + "/../a/", false);
     w->AddRomFolder(fake.writeFile("game.bin"), false);
     drop(target, {QUrl::fromLocalFile(fake.root() + "/missing")});
     drop(target, {QUrl::fromLocalFile(romFolder("games.RAR"))});
     const std::string notAFolder = "Add Folders Not Files. | That doesn't appear to be a valid "
                                    "folder.\nChoose another one. | Ok | None";
     EXPECT_EQ(boxLines(fake.dialogs),
-              (Lines{notAFolder, notAFolder, "lum | .rar files aren't supported yet | Ok | None"}));
-    EXPECT_EQ(rows(*w).size(), 3);
+              (Lines{"lum | " + a.toStdString() + " is already in the list. | Ok | Information",
+                     notAFolder, notAFolder, "lum | .rar files aren't supported yet | Ok | None"}));
+    EXPECT_EQ(rows(*w).size(), 2);
 }
 
 TEST_F(DefaultPaths, TheListsKeysAndMenuFlipRefreshAndRemoveFolders) {
@@ -178,6 +189,8 @@ TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
     const QString emu = fake.makeFolder("emu");
     const QString executable = fake.writeFile("emu/z26");
     const QString upper = fake.writeFile("other/Z26");
+    for (const QString& program : {executable, upper})
+        QFile::setPermissions(program, QFile::ReadOwner | QFile::ExeOwner);
     auto w = open();
     auto* box = control<QLineEdit>(*w, "txtDefPathz26");
     EXPECT_EQ(box->text(), fake.programFolder() + "/z26"); // until one is chosen
@@ -200,17 +213,25 @@ TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
     EXPECT_TRUE(fake.dialogs.boxes.empty());
     EXPECT_EQ(control<QLineEdit>(*open(), "txtDefPathz26")->text(), upper);
 
-    // What does not lead to the emulator is refused, and the stored path kept.
-    // The third is a folder named like the emulator, holding another such folder.
-    const QString refused[] = {fake.root() + "/missing", fake.makeFolder("empty"),
+    // What does not lead to a program is refused, and the stored path kept; a file that
+    // cannot be run is named. The third is a folder named like the emulator, holding
+    // another such folder; the last a z26 without its execute permission.
+    const QString refused[] = {fake.root() + "/missing",
+                               fake.makeFolder("empty"),
                                fake.makeFolder("trap/z26/z26").chopped(4),
                                fake.writeFile("notes.txt", "hello"),
-                               fake.root() + "/bad\nname\x01/z26"};
+                               fake.root() + "/bad\nname\x01/z26",
+                               fake.writeFile("plain/z26")};
     for (const QString& path : refused)
         drop(box, {QUrl::fromLocalFile(path)});
-    EXPECT_EQ(boxLines(fake.dialogs),
-              Lines(std::size(refused), "Non-z26 Folder Chosen. | z26 doesn't "
-                                        "exist in that path. \nChoose another one. | Ok | None"));
+    const std::string none = "Non-z26 Folder Chosen. | z26 doesn't exist in that path. \nChoose "
+                             "another one. | Ok | None";
+    const auto noProgram = [](const QString& path) {
+        return "Not a Program | " + path.toStdString() +
+               " is not a program lum can start.\nChoose the z26 program. | Ok | Exclamation";
+    };
+    EXPECT_EQ(boxLines(fake.dialogs), (Lines{none, none, noProgram(refused[2] + "/z26"),
+                                             noProgram(refused[3]), none, noProgram(refused[5])}));
     EXPECT_EQ(box->text(), upper);
     EXPECT_EQ(stored("Z26Path"), upper);
 }

@@ -235,6 +235,15 @@ TEST_F(OptionControls, PickingAVideoModeUnderDefaultWarnsEachTime) {
     get<QAbstractButton>("optVMWindow")->click();
     EXPECT_EQ(pick(2), "none");
     EXPECT_TRUE(previewHas("-v12"));
+
+    // With its control at the screen's corner, a tip still shows whole on the screen.
+    auto* anchor = get<QLineEdit>("txtVidModeBalloon");
+    const QRect area = w->screen()->availableGeometry();
+    w->move(w->pos() + area.bottomRight() - anchor->mapToGlobal(QPoint(10, 10)));
+    w->showBalloonTip("txtVidModeBalloon", 2, "A title", "A text that takes some room");
+    const BalloonTip* tip = cTextBoxXP::shownOn(anchor);
+    ASSERT_NE(tip, nullptr);
+    EXPECT_TRUE(area.contains(tip->geometry()));
 }
 
 TEST_F(OptionControls, EditSwitchesSwapsTheLabelForTheEditBoxAndEnterLaunches) {

@@ -25,15 +25,19 @@ protected:
 TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     auto w = open();
     w->showConfigStatus("before", "tip");
+    // The choosers open in the user's folder, made if missing, where Default.lum starts lum.
+    QDir(fake.platform.userFolder).removeRecursively();
     w->cmdSaveDat_Click(); // cancelled
     w->cmdLoadDat_Click(); // cancelled
     EXPECT_EQ(status(*w), "before");
     EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "tip");
     const std::string chooser = " | Choose File to Save Configuration | lum configurations "
                                 "(*.lum)|*.lum|All Files (*.*)|*.* | " +
-                                fake.programFolder().toStdString() + " | 1 | ";
+                                fake.platform.userFolder.toStdString() + " | 1 | ";
     EXPECT_EQ(requestLines(fake.dialogs),
               (Lines{"save" + chooser + "2", "open" + chooser + "1800"}));
+    EXPECT_TRUE(QFileInfo(fake.platform.userFolder).isDir());
+    EXPECT_EQ(control<QLabel>(*w, "lblConfig")->textFormat(), Qt::PlainText); // names as typed
 
     // The name as chosen in the status line; ".lum" added unless the name ends in it.
     control<QRadioButton>(*w, "optCPPAL")->click();
@@ -76,16 +80,31 @@ TEST_F(OptionSetButtons, ACorruptSetIsReportedWithWhatCameBeforeTheBadValueShown
     EXPECT_TRUE(w->isVisible());
     EXPECT_EQ(w->selectedPage(), "Settings");
 
-    // A file that cannot be read applies nothing and is reported alike.
-    EXPECT_FALSE(w->LoadSettings(fake.root() + "/missing.lum"));
+    // From the main menu the box names the file and why; one that cannot be read applies
+    // nothing.
+    fake.dialogs.paths = {fake.root() + "/missing.lum"};
+    w->loadOptionSetFromMenu();
+    EXPECT_EQ(
+        boxLine(fake.dialogs.boxes.back()),
+        "lum | " + fake.root().toStdString() +
+            "/missing.lum could not be loaded:\nNo such file or directory | Ok | Exclamation");
     EXPECT_EQ(w->options().videoMode, 3);
-    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
+    EXPECT_EQ(status(*w),
+              "missing.lum is corrupt.  Plese verify settings an re-save to correct the problem");
 }
 
 TEST_F(OptionSetButtons, SavingNeverLosesAFile) {
     auto w = open();
     save(*w, fake.root() + "/no such folder/set");
     EXPECT_EQ(status(*w), "error saving set");
+    // From the main menu a box names the file and why.
+    fake.dialogs.paths = {fake.root() + "/no such folder/set"};
+    w->saveOptionSetFromMenu();
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines{"lum | " + fake.root().toStdString() +
+                    "/no such folder/set.lum could not be saved:\nNo such file or directory | Ok | "
+                    "Exclamation"});
+    fake.dialogs.boxes.clear();
 
     const QString older = fake.root() + "/older.lum";
     ASSERT_TRUE(putFile(older, QByteArray(172, '\x11')));

@@ -68,6 +68,13 @@ TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensI
     EXPECT_TRUE(preview.isNull()) << "a closed preview is gone until the next click";
     const frmPicPreview again(fake.platform);
     EXPECT_EQ(place(&again), placed);
+
+    // A place off every screen opens on one, and stays stored until the user moves it.
+    fake.store.SaveSetting("picpos", "top", "-90000");
+    frmPicPreview off(fake.platform);
+    EXPECT_TRUE(off.screen()->availableGeometry().contains(place(&off)));
+    off.close();
+    EXPECT_EQ(fake.reopenStore()->GetSetting("picpos", "top", ""), "-90000");
 }
 
 TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {

@@ -32,9 +32,9 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
 
     const QRect tab = control<QTabWidget>(*w, "vbalDTabControl1")->geometry();
     const QWidget* strip = control<PictureBox>(*w, "picSideText");
+    // No band around the tab control: Qt's size has no title bar or borders in it.
     EXPECT_EQ(QRect(tab.topLeft(), w->size()),
-              QRect(strip->width(), 0, strip->width() + tab.width() + twips::toPixelsX(100),
-                    tab.height() + twips::toPixelsY(500)));
+              QRect(strip->width(), 0, strip->width() + tab.width(), tab.height()));
     EXPECT_TRUE(tab.width() >= twips::toPixelsX(6495) && tab.height() >= twips::toPixelsY(4095));
     EXPECT_EQ(strip->height(), w->height());
     // Every tab shows without scrolling the tab bar.
@@ -58,6 +58,9 @@ TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
     EXPECT_TRUE(w->isHidden());
     EXPECT_EQ(stored("top", "setpos"), "1500");
     w->show();
+    QTest::keyClick(control<QCheckBox>(*w, "chkBW"), Qt::Key_Escape); // as the close box
+    EXPECT_TRUE(w->isHidden());
+    w->show();
     EXPECT_EQ(w->options().blackAndWhite, Check::On);
 
     // Unload saves the place and the folder list, whose save ends it after the first.
@@ -65,4 +68,11 @@ TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
     EXPECT_TRUE(w->isHidden());
     EXPECT_EQ(stored("ROM2Path"), "");
     EXPECT_EQ(open()->pos(), QPoint(twips::toPixelsX(2400), twips::toPixelsY(1200)));
+
+    // A place off every screen opens on one, and stays stored until the user moves it.
+    fake.store.SaveSetting("setpos", "left", "-90000");
+    auto off = open();
+    EXPECT_TRUE(off->screen()->availableGeometry().contains(QRect(off->pos(), off->size())));
+    off->Unload();
+    EXPECT_EQ(stored("left", "setpos"), "-90000");
 }
