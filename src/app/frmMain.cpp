@@ -176,9 +176,9 @@ void frmMain::createMenus() {
     connect(mnuAboutlumHomePage, &QAction::triggered, this, &frmMain::mnuAboutlumHomePage_Click);
     connect(mnuAboutlumAbout, &QAction::triggered, this, &frmMain::mnuAboutlumAbout_Click);
     connect(mnuFileLoadSettings, &QAction::triggered, this,
-            [this] { settingsWindow().cmdLoadDat_Click(); });
+            [this] { settingsWindow().loadOptionSetFromMenu(); });
     connect(mnuFileSaveSettings, &QAction::triggered, this,
-            [this] { settingsWindow().cmdSaveDat_Click(); });
+            [this] { settingsWindow().saveOptionSetFromMenu(); });
 }
 
 void frmMain::assignMenuIcons() {
