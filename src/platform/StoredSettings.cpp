@@ -3,6 +3,11 @@
 namespace {
 
 const QString kSettings = QStringLiteral("Settings");
+const QString kRecent = QStringLiteral("Recent");
+
+QString recentKey(int n) {
+    return QStringLiteral("ROM") + QString::number(n);
+}
 
 // The key of folder entry n: "ROM", n without blanks (nothing for 1), then the suffix.
 QString folderKey(int n, QLatin1String suffix) {
@@ -100,4 +105,30 @@ QStringList enabledRomFolders(const SettingsStore& store) {
         if (folder.enabled)
             paths << folder.path;
     return paths;
+}
+
+QStringList readRecentRoms(const SettingsStore& store) {
+    QStringList roms;
+    for (int n = 1; n <= kRecentRomCount; ++n) {
+        const QString rom = store.GetSetting(kRecent, recentKey(n));
+        if (rom.isEmpty())
+            break;
+        roms << rom;
+    }
+    return roms;
+}
+
+void writeRecentRoms(SettingsStore& store, const QStringList& roms) {
+    for (int n = 1; n <= kRecentRomCount; ++n) {
+        if (n <= roms.size())
+            store.SaveSetting(kRecent, recentKey(n), roms[n - 1]);
+        else
+            store.DeleteSetting(kRecent, recentKey(n));
+    }
+}
+
+QStringList withRecentRom(QStringList roms, const QString& rom) {
+    roms.removeAll(rom);
+    roms.prepend(rom);
+    return roms.mid(0, kRecentRomCount);
 }

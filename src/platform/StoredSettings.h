@@ -89,3 +89,11 @@ void writeRomFolders(SettingsStore& store, const std::vector<RomFolder>& folders
 
 // The enabled folders' paths, in their stored order.
 QStringList enabledRomFolders(const SettingsStore& store);
+
+// The ROMs started last, newest first, kept as "Recent" ROM1..ROM10.
+inline constexpr int kRecentRomCount = 10;
+QStringList readRecentRoms(const SettingsStore& store);
+// Writes the list and removes the entries past its end.
+void writeRecentRoms(SettingsStore& store, const QStringList& roms);
+// The list with `rom` on top, once, and no more than kRecentRomCount entries.
+QStringList withRecentRom(QStringList roms, const QString& rom);

@@ -135,4 +135,22 @@ TEST(StoredSettings, EachKeyHasItsSectionNameAndDefault) {
                                           "ROM4Checked=True\nROM2Checked=False\nROM3Path=\n"));
 }
 
+// Newest first, each ROM once, ten at most, as the next start reads them; a shorter list
+// leaves nothing of a longer one.
+TEST(StoredSettings, RecentRomsKeepTheLastTenStartedNewestFirst) {
+    FakePlatform fake;
+    const std::pair<const char*, const char*> rows[] = {{"a", "a"},
+                                                        {"b", "b a"},
+                                                        {"a", "a b"},
+                                                        {"cdefghijkl", "l k j i h g f e d c"},
+                                                        {"c", "c l k j i h g f e d"}};
+    for (const auto& [started, expected] : rows) {
+        for (const char rom : QByteArray(started))
+            writeRecentRoms(fake.store, withRecentRom(readRecentRoms(fake.store), QString(rom)));
+        EXPECT_EQ(readRecentRoms(*fake.reopenStore()).join(' '), expected) << started;
+    }
+    writeRecentRoms(fake.store, {"/roms/z.bin"});
+    EXPECT_EQ(fileBytes(fake.iniPath()), "[Recent]\nROM1=/roms/z.bin\n");
+}
+
 } // namespace
