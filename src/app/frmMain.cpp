@@ -78,6 +78,8 @@ void frmMain::createControls() {
     connect(vbalListViewCtl1, &ListView::mouseDown, this, &frmMain::vbalListViewCtl1_MouseDown);
     connect(vbalListViewCtl1, &ListView::popupKey, this, &frmMain::showRowPopup);
     connect(vbalListViewCtl1, &ListView::itemDoubleClicked, this, [this] { LoadROM(false); });
+    connect(vbalListViewCtl1, &ListView::fileDropped, this,
+            [this](const QString& path) { launchRom(path, false); });
 
     picBack = new QLabel(central);
     picBack->setObjectName(QStringLiteral("picBack"));
@@ -133,6 +135,10 @@ void frmMain::createMenus() {
     mnuFile = menu(menuBar()->addMenu(QStringLiteral("&File")), "mnuFile");
     mnuFileLoadSettings = item(mnuFile, "mnuFileLoadSettings", "&Load Settings");
     mnuFileSaveSettings = item(mnuFile, "mnuFileSaveSettings", "&Save Settings");
+    mnuFileRecent = menu(mnuFile->addMenu(QStringLiteral("&Recent ROMs")), "mnuFileRecent");
+    mnuFileRecent->setToolTipsVisible(true);
+    connect(mnuFileRecent, &QMenu::aboutToShow, this, &frmMain::fillRecentMenu);
+    fillRecentMenu();
     separator(mnuFile, "mnuBar3");
     mnuFileExit = item(mnuFile, "mnuFileExit", "E&xit");
 
@@ -181,6 +187,36 @@ void frmMain::createMenus() {
             [this] { settingsWindow().saveOptionSetFromMenu(); });
 }
 
+void frmMain::fillRecentMenu() {
+    // Not clear(): an item of this menu may be the one whose click runs this.
+    for (QAction* old : mnuFileRecent->actions()) {
+        mnuFileRecent->removeAction(old);
+        old->setParent(nullptr);
+        old->deleteLater();
+    }
+    const QStringList roms = readRecentRoms(m_platform.store);
+    for (int n = 0; n < roms.size(); ++n) {
+        const QFileInfo rom(roms[n]);
+        QAction* action =
+            mnuFileRecent->addAction(rom.fileName().replace(u'&', QStringLiteral("&&")));
+        action->setObjectName(QStringLiteral("mnuFileRecentROM") + QString::number(n + 1));
+        // No status bar to show a status tip: the folder shows as the item's tip too.
+        action->setStatusTip(QDir::toNativeSeparators(rom.absolutePath()));
+        action->setToolTip(action->statusTip());
+        action->setEnabled(rom.isFile());
+        const QString path = roms[n];
+        connect(action, &QAction::triggered, this, [this, path] { launchRom(path, false); });
+    }
+    mnuFileRecent->addSeparator()->setObjectName(QStringLiteral("mnuFileRecentBar"));
+    QAction* clear = mnuFileRecent->addAction(QStringLiteral("&Clear List"));
+    clear->setObjectName(QStringLiteral("mnuFileRecentClear"));
+    clear->setEnabled(!roms.isEmpty());
+    connect(clear, &QAction::triggered, this, [this] {
+        writeRecentRoms(m_platform.store, {});
+        fillRecentMenu();
+    });
+}
+
 void frmMain::assignMenuIcons() {
     // The icons are made when a menu first opens: nothing of them is needed for the
     // window's first paint.
@@ -213,27 +249,7 @@ void frmMain::Form_Load() {
     connect(mcrc32.get(), &CCRC32::Progress, this,
             [] { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); });
 
-    // The user's own start options first; the set that ships beside the program else.
-    QString defaultFile = m_platform.userFolder + QStringLiteral("/Default.lum");
-    if (!QFileInfo(defaultFile).isFile())
-        defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
-    if (QFileInfo(defaultFile).isFile()) {
-        // A sound option set waits for the settings window; a corrupt one is reported now.
-        const OptionSetRead optionSet =
-            readOptionFile(defaultFile, m_settings ? m_settings->options() : EmulatorOptions());
-        const bool loaded = optionSet.ok();
-        if (m_settings || !loaded)
-            settingsWindow().LoadSettings(optionSet);
-        else
-            m_startOptions = optionSet.options;
-        showConfigCaption(loaded ? QStringLiteral("Default.lum was succesfully loaded")
-                                 : QStringLiteral("Default.lum is corrupt.  Please verify "
-                                                  "settings and re-save to correct the problem."),
-                          QString());
-    } else {
-        showConfigCaption(QStringLiteral("Default.lum couldn't be loaded"),
-                          QStringLiteral("Default.lum need's to be in the same folder as lum"));
-    }
+    loadStartOptions();
 
     const SettingsStore& store = m_platform.store;
     const WindowPlace place = read(store, stored::mainWindow);
@@ -249,13 +265,7 @@ void frmMain::Form_Load() {
     vbalListViewCtl1->setForeColor(read(store, stored::textColor));
     ApplyBackground();
 
-    QString z26Path = read(store, stored::z26Path);
-    if (z26Path.isEmpty()) {
-        // A z26 installed the usual way needs no first-run question.
-        z26Path = findProgramOnPath(z26FileName());
-        if (!z26Path.isEmpty())
-            write(m_platform.store, stored::z26Path, z26Path);
-    }
+    const QString z26Path = storedOrFoundZ26Path();
     const bool bRomPath = !readRomFolders(store).empty();
 
     if (!z26Path.isEmpty() && bRomPath) {
@@ -280,6 +290,41 @@ void frmMain::Form_Load() {
             MsgButtons::Ok, MsgIcon::None, QStringLiteral("Choose ROM's Path"));
     settingsWindow().selectPage(QStringLiteral("DefaultPaths"));
     settingsWindow().show();
+}
+
+void frmMain::loadStartOptions() {
+    // The user's own start options first; the set that ships beside the program else.
+    QString defaultFile = m_platform.userFolder + QStringLiteral("/Default.lum");
+    if (!QFileInfo(defaultFile).isFile())
+        defaultFile = m_platform.programFolder + QStringLiteral("/Default.lum");
+    if (QFileInfo(defaultFile).isFile()) {
+        // A sound option set waits for the settings window; a corrupt one is reported now.
+        const OptionSetRead optionSet =
+            readOptionFile(defaultFile, m_settings ? m_settings->options() : EmulatorOptions());
+        const bool loaded = optionSet.ok();
+        if (m_settings || !loaded)
+            settingsWindow().LoadSettings(optionSet);
+        else
+            m_startOptions = optionSet.options;
+        showConfigCaption(loaded ? QStringLiteral("Default.lum was succesfully loaded")
+                                 : QStringLiteral("Default.lum is corrupt.  Please verify "
+                                                  "settings and re-save to correct the problem."),
+                          QString());
+    } else {
+        showConfigCaption(QStringLiteral("Default.lum couldn't be loaded"),
+                          QStringLiteral("Default.lum need's to be in the same folder as lum"));
+    }
+}
+
+QString frmMain::storedOrFoundZ26Path() {
+    QString z26Path = read(m_platform.store, stored::z26Path);
+    if (z26Path.isEmpty()) {
+        // A z26 installed the usual way needs no first-run question.
+        z26Path = findProgramOnPath(z26FileName());
+        if (!z26Path.isEmpty())
+            write(m_platform.store, stored::z26Path, z26Path);
+    }
+    return z26Path;
 }
 
 void frmMain::addListColumns() {
@@ -417,6 +462,10 @@ void frmMain::mnuMainRefresh_Click() {
 }
 
 bool frmMain::eventFilter(QObject* watched, QEvent* event) {
+    // Closed, not minimised: a command-line run waiting for its switches ends.
+    if (watched == m_settings.get() && event->type() == QEvent::Hide && !event->spontaneous() &&
+        !m_commandLineRom.isEmpty())
+        emit commandLineDone(1);
     if (watched == txtSearch) {
         if (event->type() == QEvent::KeyPress) {
             const auto* key = static_cast<QKeyEvent*>(event);

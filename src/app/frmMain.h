@@ -13,6 +13,7 @@
 #include <utility>
 #include <vector>
 
+struct CommandLine;
 struct Platform;
 class frmAbout;
 class frmSettings;
@@ -46,9 +47,22 @@ public:
     // the switches as the user edited them.
     void LoadROM(bool ForceLoad = false);
 
+    enum class Launch { Started, NotStarted, EditingSwitches };
+    // The launch of one ROM file, whoever asks for it: the list, a drop, the Recent ROMs
+    // menu or the command line. A ROM started goes on top of the recent list.
+    Launch launchRom(const QString& romPath, bool ForceLoad);
+
+    // Runs a command line that names a ROM file, this window staying hidden: the exit
+    // status once z26 is started (0) or the box saying why not is closed (1); nothing while
+    // the settings window waits for the user's edited switches (commandLineDone then).
+    std::optional<int> startFromCommandLine(const CommandLine& command);
+
     // The settings window, built on first use.
     frmSettings& settingsWindow();
     RomListModel& listModel() { return *m_listModel; }
+
+signals:
+    void commandLineDone(int exitStatus);
 
 protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
@@ -67,6 +81,7 @@ private:
     QMenu* mnuFile = nullptr;
     QAction* mnuFileLoadSettings = nullptr;
     QAction* mnuFileSaveSettings = nullptr;
+    QMenu* mnuFileRecent = nullptr;
     QAction* mnuFileExit = nullptr;
     QMenu* mnuSettings = nullptr;
     QAction* mnuSettingsConfiguration = nullptr;
@@ -101,6 +116,12 @@ private:
     void addListColumns();
     void assignMenuIcons();
     void assignMenuIconsNow();
+    // Default.lum's options: the user's own, else the program's.
+    void loadStartOptions();
+    // The stored z26 path, or a z26 on PATH, stored then.
+    QString storedOrFoundZ26Path();
+    // The Recent ROMs menu from the stored list; a ROM that is gone shows disabled.
+    void fillRecentMenu();
     void Form_Resize();
     void Form_Unload();
     void mnuFileExit_Click();
@@ -126,6 +147,8 @@ private:
     void showEmulatorDocument(const QString& fileName);
     // The folder z26 runs in.
     QString emulatorWorkingFolder(const QString& emulator) const;
+    // The owner of the launch's boxes.
+    QWidget* boxOwner();
     // Says that z26 at `emulator` could not be started, and why.
     void launchFailed(const QString& emulator, const QString& reason);
     // The software ID of a ROM file in the game database beside the program, or 0.
@@ -142,6 +165,8 @@ private:
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;
+    // The ROM a command line names: the launches of this run are all of it.
+    QString m_commandLineRom;
     ScreenFit m_place;          // as opened: a corrected place is not saved unless changed
     QPointer<frmAbout> m_about; // one at a time
     RomListModel* m_listModel = nullptr;

@@ -1,3 +1,4 @@
+#include "app/CommandLine.h"
 #include "app/frmMain.h"
 #include "platform/Downloader.h"
 #include "platform/IniSettingsStore.h"
@@ -10,7 +11,20 @@
 #include <QApplication>
 #include <QIcon>
 
+#include <cstdio>
+
 int main(int argc, char** argv) {
+    // Read before any display is opened: --help and --version need none.
+    QStringList arguments;
+    for (int i = 0; i < argc; ++i)
+        arguments << QString::fromLocal8Bit(argv[i]);
+    const CommandLine command = parseCommandLine(arguments);
+    if (command.mode == CommandLine::Mode::Print || command.mode == CommandLine::Mode::Fail) {
+        std::fputs(command.text.toLocal8Bit().constData(),
+                   command.mode == CommandLine::Mode::Print ? stdout : stderr);
+        return command.exitStatus;
+    }
+
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("lum"));
     QApplication::setWindowIcon(QIcon(QStringLiteral(":/lum.png")));
@@ -28,6 +42,12 @@ int main(int argc, char** argv) {
                       folders.data};
 
     frmMain window(platform);
+    if (command.mode != CommandLine::Mode::Window) {
+        if (const std::optional<int> status = window.startFromCommandLine(command))
+            return *status;
+        QObject::connect(&window, &frmMain::commandLineDone, &app, &QCoreApplication::exit);
+        return QApplication::exec();
+    }
     window.Form_Load();
     window.show();
     return QApplication::exec();

@@ -187,6 +187,13 @@ void frmSettings::selectPage(const QString& key) {
     }
 }
 
+QString frmSettings::pageCaption(const QString& key) {
+    for (const TabInfo& tab : kTabs)
+        if (key == QLatin1String(tab.key))
+            return QString::fromUtf8(tab.caption);
+    return QString();
+}
+
 QString frmSettings::selectedPage() const {
     return tabKey(m_ui->vbalDTabControl1->currentIndex());
 }

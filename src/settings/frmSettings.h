@@ -46,6 +46,8 @@ public:
     // "DefaultPaths". An unknown key changes nothing.
     void selectPage(const QString& key);
     QString selectedPage() const;
+    // A page's caption on its tab, or the empty text for an unknown key.
+    static QString pageCaption(const QString& key);
     // Brings the window up on that page.
     void showPage(const QString& key);
     // A balloon tip at one of the window's controls, named by its objectName.

@@ -5,11 +5,28 @@
 #include "ui/PictureFile.h"
 
 #include <QContextMenuEvent>
+#include <QFileInfo>
 #include <QHeaderView>
 #include <QKeyEvent>
+#include <QMimeData>
 #include <QMouseEvent>
 
+namespace {
+
+// The first local file of a drop, or the empty text.
+QString firstDroppedFile(const QMimeData* data) {
+    if (data != nullptr)
+        for (const QUrl& url : data->urls())
+            if (url.isLocalFile() && QFileInfo(url.toLocalFile()).isFile())
+                return url.toLocalFile();
+    return QString();
+}
+
+} // namespace
+
 ListView::ListView(QWidget* parent) : QTreeView(parent) {
+    setAcceptDrops(true);
+    viewport()->setAcceptDrops(true);
     setRootIsDecorated(false);
     setItemsExpandable(false);
     setUniformRowHeights(true); // keeps 100,000 rows cheap to lay out
@@ -97,4 +114,22 @@ void ListView::requestPopupAtCurrentRow() {
     const QRect row = visualRect(currentIndex());
     const QPoint at = row.isValid() ? row.bottomLeft() : QPoint(0, 0);
     emit popupKey(viewport()->mapToGlobal(at));
+}
+
+void ListView::dragEnterEvent(QDragEnterEvent* event) {
+    if (!firstDroppedFile(event->mimeData()).isEmpty())
+        event->acceptProposedAction();
+}
+
+void ListView::dragMoveEvent(QDragMoveEvent* event) {
+    if (!firstDroppedFile(event->mimeData()).isEmpty())
+        event->acceptProposedAction();
+}
+
+void ListView::dropEvent(QDropEvent* event) {
+    const QString file = firstDroppedFile(event->mimeData());
+    if (file.isEmpty())
+        return;
+    event->acceptProposedAction();
+    emit fileDropped(file);
 }

@@ -31,11 +31,16 @@ signals:
     void mouseDown(Qt::MouseButton button, QPoint globalPos);
     // The Menu key or Shift+F10: a popup for the current row, at that row.
     void popupKey(QPoint globalPos);
+    // A file dropped from a file manager: the first file of the drop, folders passed over.
+    void fileDropped(const QString& path);
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
+    void dragEnterEvent(QDragEnterEvent* event) override;
+    void dragMoveEvent(QDragMoveEvent* event) override;
+    void dropEvent(QDropEvent* event) override;
 
 private:
     void requestPopupAtCurrentRow();

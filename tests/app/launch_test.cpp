@@ -1,6 +1,10 @@
 #include "AppFixture.h"
 
+#include "app/CommandLine.h"
+#include "emulator/OptionFile.h"
 #include "platform/QtShell.h"
+
+#include <QMimeData>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -91,4 +95,88 @@ TEST_F(MainWindow, ChecksThePathsAndTheOptionsThenStartsTheEmulator) {
     EXPECT_EQ(fileBytes(z26 + ".txt"), (fake.root() + "/roms/").toUtf8() + name + "\n-p8\n-M1\n");
     EXPECT_EQ(window->listModel().index(0, 0).data(), "Café (it's \"good\") $HOME.bin");
     window.reset(); // before the shell and platform it uses, even when a check failed
+}
+
+// What each command line asks for: a ROM file by its absolute path, a file that cannot be
+// opened named with the reason.
+TEST(CommandLine, TellsWhatToDoAndWhyNot) {
+    FakePlatform fake;
+    const QString rom = fake.writeFile("River Raid.a26");
+    const QString was = QDir::currentPath();
+    QDir::setCurrent(fake.root());
+    using enum CommandLine::Mode;
+    const std::tuple<QStringList, CommandLine::Mode, QString> cases[] = {
+        {{}, Window, ""},
+        {{"--version"}, Print, "lum 1.1.12\n"},
+        {{"--help"}, Print, "Usage: lum [options] [FILE]\nA front end for the z26"},
+        {{"River Raid.a26"}, Launch, "~/River Raid.a26"},
+        {{"gone.bin"},
+         Refuse,
+         "The ROM file cannot be opened:\n\n~/gone.bin\n\nThere is no such "
+         "file."},
+        {{"."}, Refuse, "The ROM file cannot be opened:\n\n~\n\nIt is a folder, not a file."},
+        {{"-x", rom}, Fail, "lum: Unknown option 'x'.\nUsage: lum [options] [FILE]\n"}};
+    for (const auto& [arguments, mode, text] : cases) {
+        const CommandLine command = parseCommandLine(QStringList("lum") + arguments);
+        const QString said = QString(command.text + command.romPath).replace(fake.root(), "~");
+        EXPECT_EQ(std::tuple(command.mode, command.exitStatus, said.left(text.size())),
+                  std::tuple(mode, mode == Refuse || mode == Fail ? 1 : 0, text))
+            << arguments.join(' ').toStdString();
+    }
+    QDir::setCurrent(was);
+}
+
+// A ROM named on the command line, dropped on the list or chosen from Recent ROMs starts as a
+// double-click does, and goes on top of Recent ROMs. The command line shows no main window, and
+// says in a box what a double-click would show on the settings window.
+TEST_F(MainWindow, StartsCommandLineDroppedAndRecentRoms) {
+    storePaths({"a.bin", "b.bin"});
+    EmulatorOptions o;
+    o.lowerSensitivity = Check::On;
+    o.lowerSensitivityBy = "2";
+    fake.writeFile("config/lum/Default.lum", encodeOptions(o));
+    const auto commandLine = [&](const QString& file) {
+        window = std::make_unique<frmMain>(fake.platform);
+        const auto status = window->startFromCommandLine(parseCommandLine({"lum", file}));
+        return QString::number(status.value_or(-1)) + (window->isVisible() ? " shown\n" : "\n") +
+               happened();
+    };
+    EXPECT_EQ(commandLine(fake.root() + "/roms/b.bin"),
+              "0\n~/emu/z26 ~/roms/b.bin -p8 -P2 -M1 in ~/emu");
+    EXPECT_EQ(commandLine(fake.root() + "/gone.bin"),
+              "1\nlum | The ROM file cannot be opened:\n\n~/gone.bin\n\nThere is no such file. | "
+              "Ok | Exclamation");
+    o.lowerSensitivityBy = "0";
+    fake.writeFile("config/lum/Default.lum", encodeOptions(o));
+    EXPECT_EQ(
+        commandLine(fake.root() + "/roms/a.bin"),
+        "1\nZero Value | The ROM was not started:\n\n~/roms/a.bin\n\nNumber Cannot Be Zero\n\n"
+        "Mend it on the page \"Paddles / Audio\" of lum's Settings, Configuration, and save "
+        "the options as Default.lum. | Ok | Exclamation");
+
+    const auto recent = [this] {
+        QStringList items;
+        for (QAction* item : control<QMenu>(*window, "mnuFileRecent")->actions())
+            items << item->text() + (item->isEnabled() ? "" : " off") + ' ' + item->statusTip();
+        return items.join(" | ").replace(QDir::toNativeSeparators(fake.root()), "~");
+    };
+    fake.writeFile("config/lum/Default.lum", encodeOptions(EmulatorOptions()));
+    reload();
+    QMimeData data; // the first file, the folder passed over
+    data.setUrls({QUrl::fromLocalFile(fake.root() + "/roms"),
+                  QUrl::fromLocalFile(fake.root() + "/roms/a.bin"),
+                  QUrl::fromLocalFile(fake.root() + "/roms/b.bin")});
+    QDropEvent drop(QPointF(5, 5), Qt::CopyAction, &data, Qt::LeftButton, {});
+    QDragEnterEvent enter(QPoint(5, 5), Qt::CopyAction, &data, Qt::LeftButton, {});
+    QApplication::sendEvent(list()->viewport(), &enter);
+    QApplication::sendEvent(list()->viewport(), &drop);
+    EXPECT_EQ(happened(), "~/emu/z26 ~/roms/a.bin -p8 -M1 in ~/emu");
+    EXPECT_EQ(recent(), "a.bin ~/roms | b.bin ~/roms |   | &Clear List ");
+    ASSERT_TRUE(QFile::remove(fake.root() + "/roms/a.bin"));
+    emit control<QMenu>(*window, "mnuFileRecent")->aboutToShow();
+    action("mnuFileRecentROM2")->trigger();
+    EXPECT_EQ(happened(), "~/emu/z26 ~/roms/b.bin -p8 -M1 in ~/emu");
+    EXPECT_EQ(recent(), "b.bin ~/roms | a.bin off ~/roms |   | &Clear List ");
+    action("mnuFileRecentClear")->trigger();
+    EXPECT_EQ(recent() + stored("ROM1", "Recent"), "  | &Clear List off <missing>");
 }
