@@ -16,6 +16,7 @@ folder="$(dirname "$program")"
     [ -f "$folder/$f" ] || { echo "missing beside the program: $f"; exit 1; }
 done
 [ -f "$prefix/share/applications/lum.desktop" ] || { echo "missing desktop entry"; exit 1; }
+desktop-file-validate "$prefix/share/applications/lum.desktop"
 [ -f "$prefix/share/icons/hicolor/128x128/apps/lum.png" ] || { echo "missing icon"; exit 1; }
 
 # Start it with both paths known (no first-run box), offscreen; it must still be running
@@ -35,4 +36,8 @@ if ! kill -0 "$pid" 2>/dev/null; then
 fi
 kill "$pid"
 wait "$pid" 2>/dev/null || true
+# The installed program answers --version without a display.
+version="$(env -u DISPLAY -u WAYLAND_DISPLAY -u QT_QPA_PLATFORM "$prefix/bin/lum" --version)"
+[ "$version" = "lum $(sed -n 's/^project(lum VERSION \([0-9.]*\).*/\1/p' "$source/CMakeLists.txt")" ] \
+    || { echo "lum --version said: $version"; exit 1; }
 echo "installed tree OK"
