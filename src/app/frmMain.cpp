@@ -50,7 +50,11 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
     createMenus();
 }
 
-frmMain::~frmMain() = default;
+frmMain::~frmMain() {
+    // The settings window outlives the members a command-line run's filter reads.
+    if (m_settings)
+        m_settings->removeEventFilter(this);
+}
 
 void frmMain::createControls() {
     auto* central = new QWidget(this);
