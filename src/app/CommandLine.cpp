@@ -1,23 +1,36 @@
 #include "app/CommandLine.h"
 
+#include "platform/FileSystem.h"
+
 #include <QCommandLineParser>
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
 
 #include "lum_version.h"
 
+#include <cerrno>
+#include <cstring>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 namespace {
 
 // Why a ROM file cannot be opened, or the empty text when it can.
+// By the name's bytes, so that a name that is not UTF-8 is found as well.
 QString whyUnreadable(const QString& path) {
-    const QFileInfo info(path);
-    if (!info.exists())
+    const QByteArray bytes = nameToFileSystem(path);
+    struct stat status {};
+    if (::stat(bytes.constData(), &status) != 0)
         return QStringLiteral("There is no such file.");
-    if (info.isDir())
+    if (S_ISDIR(status.st_mode))
         return QStringLiteral("It is a folder, not a file.");
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? QString() : file.errorString();
+    const int fd = ::open(bytes.constData(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+    if (fd < 0)
+        return QString::fromLocal8Bit(std::strerror(errno));
+    ::close(fd);
+    return QString();
 }
 
 } // namespace

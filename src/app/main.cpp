@@ -1,6 +1,7 @@
 #include "app/CommandLine.h"
 #include "app/frmMain.h"
 #include "platform/Downloader.h"
+#include "platform/FileSystem.h"
 #include "platform/IniSettingsStore.h"
 #include "platform/Platform.h"
 #include "platform/QtDialogs.h"
@@ -17,7 +18,7 @@ int main(int argc, char** argv) {
     // Read before any display is opened: --help and --version need none.
     QStringList arguments;
     for (int i = 0; i < argc; ++i)
-        arguments << QString::fromLocal8Bit(argv[i]);
+        arguments << nameFromFileSystem(argv[i]); // a ROM's name keeps its bytes
     const CommandLine command = parseCommandLine(arguments);
     if (command.mode == CommandLine::Mode::Print || command.mode == CommandLine::Mode::Fail) {
         std::fputs(command.text.toLocal8Bit().constData(),
