@@ -308,7 +308,7 @@ TEST_F(About, StaysOpenWhileADownloadWaits) {
     Platform platform = fake.with(impatient);
     QPointer<frmAbout> busy = new frmAbout(platform, nullptr, server.base());
     busy->show();
-    server.stall("/programs/update.txt");
+    server.responses["/programs/update.txt"] = {.silent = true};
     QTimer::singleShot(50, busy, [&] { busy->close(); });
     QTest::mouseClick(busy->cmdUpdate, Qt::LeftButton);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
