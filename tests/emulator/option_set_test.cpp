@@ -49,14 +49,6 @@ bool unused(int offset) {
            (offset >= 64 && offset < 68);
 }
 
-void putInt16(QByteArray& data, int offset, qint16 value) {
-    qToLittleEndian<qint16>(value, reinterpret_cast<uchar*>(data.data()) + offset);
-}
-
-void putSingle(QByteArray& data, int offset, float value) {
-    qToLittleEndian<float>(value, reinterpret_cast<uchar*>(data.data()) + offset);
-}
-
 } // namespace
 
 // Every option at its offset, the unused bytes zero on the way out and ignored on the way
@@ -84,12 +76,12 @@ TEST(OptionSet, EveryOptionLandsAtItsOffsetAndReadsBack) {
 
 TEST(OptionSet, FlagsSelectTheLastSetButtonOrTheGroupsStart) {
     QByteArray data = encodeOptions(EmulatorOptions());
-    putInt16(data, 2, 1);              // "Default" video start, any non-zero value
-    putInt16(data, 4, qint16(0x8000)); // and "Fullscreen" after it
-    putInt16(data, 70, 7);             // keyboard paddle 1
-    putInt16(data, 96, 0);             // no frame rate button at all
+    qToLittleEndian<qint16>(1, data.data() + 2); // "Default" video start, any non-zero value
+    qToLittleEndian<qint16>(qint16(0x8000), data.data() + 4); // and "Fullscreen" after it
+    qToLittleEndian<qint16>(7, data.data() + 70);             // keyboard paddle 1
+    qToLittleEndian<qint16>(0, data.data() + 96);             // no frame rate button at all
     for (int offset = 76; offset < 84; offset += 2)
-        putInt16(data, offset, 0); // no paddle for the first mouse: "None"
+        qToLittleEndian<qint16>(0, data.data() + offset); // no paddle for the first mouse: "None"
     EmulatorOptions base;
     base.frameRate = FrameRate::Monitor;
     base.mousePaddle1 = Paddle::P2;
@@ -122,9 +114,9 @@ TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
     for (const auto& c : cases) {
         QByteArray data = encodeOptions(sampleOptions());
         if (c.bSingle)
-            putSingle(data, c.offset, c.value);
+            qToLittleEndian<float>(c.value, data.data() + c.offset);
         else
-            putInt16(data, c.offset, static_cast<qint16>(c.value));
+            qToLittleEndian<qint16>(static_cast<qint16>(c.value), data.data() + c.offset);
         const OptionSetRead read = decodeOptions(data, base);
         EXPECT_EQ(read.firstBad, c.firstBad) << c.offset;
         EXPECT_EQ(read.status,
@@ -138,7 +130,7 @@ TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
     // A slider takes the nearest whole number, halves to the even one.
     for (const auto& [stored, shown] : {std::pair{8.5f, 8}, {7.5f, 8}, {-0.4f, 0}}) {
         QByteArray data = encodeOptions(sampleOptions());
-        putSingle(data, 120, stored);
+        qToLittleEndian<float>(stored, data.data() + 120);
         EXPECT_EQ(decodeOptions(data, base).options.phosphor, shown) << stored;
     }
 }
@@ -176,13 +168,8 @@ TEST(OptionFile, SourcesWithoutAWholeSetApplyNothing) {
     ASSERT_EQ(mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
     const QString locked = makeUnreadable(dir.filePath("locked.lum"), good);
     ASSERT_FALSE(locked.isEmpty());
-    const QString huge = dir.filePath("huge.lum");
-    {
-        QFile file(huge);
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(good);
-        ASSERT_TRUE(file.resize(qint64(1) << 30)); // sparse: read for its first set only
-    }
+    const QString huge = dir.filePath("huge.lum"); // sparse: read for its first set only
+    ASSERT_TRUE(putFile(huge, good) && QFile::resize(huge, qint64(1) << 30));
     using S = OptionSetRead::Status;
     const struct {
         QString path;
