@@ -17,7 +17,11 @@ TEST_F(SettingsWindow, StartsAsTheGoldenDumpShows) {
 }
 
 // The window is the side strip, which names the page shown, and the tab control beside it.
-TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
+// Closing it hides it; Unload saves its place.
+TEST_F(SettingsWindow, PagesAreChosenByKeyClosingHidesAndUnloadSavesThePlace) {
+    fake.store.SaveSetting("setpos", "top", "1500");
+    storeFolder(1, romFolder("a"), true);
+    storeFolder(3, romFolder("c"), true); // behind a gap
     auto w = open();
     ASSERT_TRUE(QTest::qWaitForWindowExposed(w.get()));
     const int draws = w->Logo().drawCount();
@@ -43,15 +47,7 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
     // The hidden balloon anchor lies over the control its tip is about.
     EXPECT_EQ(control<QLineEdit>(*w, "txtVidModeBalloon")->geometry(),
               control<QComboBox>(*w, "comboVideoMode")->geometry());
-}
 
-TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
-    fake.store.SaveSetting("setpos", "top", "1500");
-
-    storeFolder(1, romFolder("a"), true);
-    storeFolder(3, romFolder("c"), true); // behind a gap
-    auto w = open();
-    ASSERT_TRUE(QTest::qWaitForWindowExposed(w.get()));
     control<QCheckBox>(*w, "chkBW")->click();
     w->move(twips::toPixelsX(2400), twips::toPixelsY(1200));
     EXPECT_FALSE(w->close());
