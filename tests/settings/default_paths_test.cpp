@@ -68,10 +68,8 @@ TEST_F(DefaultPaths, ThePageCountsFoldersWithThePatternKeepsMissingOnesAndReload
     const QString b = romFolder("b with blank", {"1.bin"});
     const QString gone = fake.root() + "/gone";
     const QString file = fake.writeFile("file.bin"); // a file where a folder belongs
-    storeFolder(1, a, false);
-    storeFolder(2, gone, true);
-    storeFolder(3, file, true);
-    storeFolder(4, b, true);
+    for (int n = 1; const QString& path : {a, gone, file, b})
+        storeFolder(n++, path, path != a);
     const std::vector<RomFolder> all = readRomFolders(fake.store);
     auto w = std::make_unique<frmSettings>(fake.platform);
     EXPECT_EQ(rows(*w), QStringList({a + "  off", gone + " 0 on", file + " 0 on", b + "  on"}));

@@ -34,11 +34,8 @@ protected:
     // A bar's window, value and text: "4500..4700 at 4608 '4,608'".
     std::string bar(const char* name) {
         const auto* b = get<vbalProgressBar>(name);
-        return QString("%1..%2 at %3 '%4'")
-            .arg(b->Min())
-            .arg(b->Max())
-            .arg(b->Value())
-            .arg(b->Text())
+        return QString::asprintf("%d..%d at %d '%s'", b->Min(), b->Max(), b->Value(),
+                                 qPrintable(b->Text()))
             .toStdString();
     }
 
@@ -93,7 +90,6 @@ TEST_F(OptionControls, EachControlSpeaksThroughItsSwitch) {
         get<QLineEdit>(name)->setText(text);
     for (const char* sw : {"-g7", "-)PC", "-(NC", "-h200", "-u31", "-P5"})
         EXPECT_TRUE(previewHas(sw)) << sw;
-    EXPECT_EQ(get<QLineEdit>("txtDOSOutput")->text(), preview());
     EXPECT_EQ(preview(), launchSwitches(w->options()).mid(1));
     EXPECT_GE(changes.count(), 40);
 

@@ -34,16 +34,14 @@ TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensI
     EXPECT_FALSE(preview->isVisible());
 
     preview->resize(400, 300);
-    const struct {
-        QSize picture;
-        QRect image;
-    } cases[] = {{{400, 100}, {0, 100, 400, 100}}, // wider: the whole width
-                 {{100, 500}, {170, 0, 60, 300}},  // taller: the whole height
-                 {{800, 600}, {0, 0, 400, 300}}};
-    for (const auto& c : cases) {
-        const QString path = picture("a.jpg", c.picture.width(), c.picture.height());
+    const std::pair<QSize, QRect> cases[] = {
+        {{400, 100}, {0, 100, 400, 100}}, // wider: the whole width
+        {{100, 500}, {170, 0, 60, 300}},  // taller: the whole height
+        {{800, 600}, {0, 0, 400, 300}}};
+    for (const auto& [size, image] : cases) {
+        const QString path = picture("a.jpg", size.width(), size.height());
         ASSERT_TRUE(preview->showPicture(path, "Paddle Control Layout"));
-        EXPECT_EQ(preview->PPImg->geometry(), c.image);
+        EXPECT_EQ(preview->PPImg->geometry(), image);
     }
     EXPECT_TRUE(preview->PPImg->isVisible() && !preview->PPPic->isVisible());
     preview->resize(600, 300);
