@@ -66,10 +66,7 @@ TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
     const LaunchGuard rateZero{"", "Video",      "txtFPScustom",
                                3,  "Zero Value", "Number Cannot Be Zero"};
     using O = EmulatorOptions;
-    const struct {
-        void (*edit)(O&);
-        std::vector<LaunchGuard> guards;
-    } cases[] = {
+    const std::pair<void (*)(O&), std::vector<LaunchGuard>> cases[] = {
         {[](O&) {}, {}},
         {[](O& o) {
              o.inactiveKeyboard = o.inactiveMouse = o.inactiveJoystick = o.inactiveStelladaptor =
@@ -93,9 +90,9 @@ TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
          },
          {noControllers, lowerZero, rateZero}},
     };
-    for (std::size_t n = 0; n < std::size(cases); ++n) {
+    for (std::size_t n = 0; const auto& [edit, guards] : cases) {
         EmulatorOptions o;
-        cases[n].edit(o);
-        EXPECT_TRUE(launchGuards(o) == cases[n].guards) << "case " << n;
+        edit(o);
+        EXPECT_TRUE(launchGuards(o) == guards) << "case " << n++;
     }
 }
