@@ -34,7 +34,8 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyClosingHidesAndUnloadSavesThePlace) {
     w->selectPage("Nowhere");
     EXPECT_EQ(w->selectedPage(), "Debug");
 
-    const QRect tab = control<QTabWidget>(*w, "vbalDTabControl1")->geometry();
+    const auto* tabs = control<QTabWidget>(*w, "vbalDTabControl1");
+    const QRect tab = tabs->geometry();
     const QWidget* strip = control<PictureBox>(*w, "picSideText");
     // No band around the tab control: Qt's size has no title bar or borders in it.
     EXPECT_EQ(QRect(tab.topLeft(), w->size()),
@@ -42,8 +43,7 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyClosingHidesAndUnloadSavesThePlace) {
     EXPECT_TRUE(tab.width() >= twips::toPixelsX(6495) && tab.height() >= twips::toPixelsY(4095));
     EXPECT_EQ(strip->height(), w->height());
     // Every tab shows without scrolling the tab bar.
-    EXPECT_LE(control<QTabWidget>(*w, "vbalDTabControl1")->tabBar()->sizeHint().width(),
-              tab.width());
+    EXPECT_LE(tabs->tabBar()->sizeHint().width(), tab.width());
     // The hidden balloon anchor lies over the control its tip is about.
     EXPECT_EQ(control<QLineEdit>(*w, "txtVidModeBalloon")->geometry(),
               control<QComboBox>(*w, "comboVideoMode")->geometry());
