@@ -23,10 +23,7 @@ protected:
         w = open();
         ASSERT_TRUE(QTest::qWaitForWindowActive(w.get()));
     }
-    void TearDown() override {
-        w.reset();
-        QLocale::setDefault(m_savedLocale);
-    }
+    void TearDown() override { QLocale::setDefault(m_savedLocale); }
 
     template <class T> T* get(const char* name) { return control<T>(*w, name); }
     QString preview() { return get<QLabel>("lblDOSOutput")->text(); }

@@ -85,8 +85,6 @@ TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {
     auto w = open();
     auto* left = control<QPushButton>(*w, "cmdLeftControlPic");
     auto* right = control<QPushButton>(*w, "cmdRightControlPic");
-    left->click(); // no picture file yet
-    EXPECT_EQ(boxLines(fake.dialogs), Lines{kError});
     picture("lum Paddles.jpg", 40, 20);
     picture("lum Driving.jpg", 40, 20);
     control<QComboBox>(*w, "comboLeftController")->setCurrentIndex(2);  // Paddle Controller
@@ -106,5 +104,5 @@ TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {
     QTest::mouseClick(left, Qt::LeftButton);
     const frmPicPreview* next = w->findChild<frmPicPreview*>();
     EXPECT_TRUE(next && next->isVisible());
-    EXPECT_EQ(fake.dialogs.boxes.size(), 1u);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
 }
