@@ -141,35 +141,11 @@ protected:
     }
 };
 
-TEST_F(About, SystemInformation) {
-    fake.writeFile("msinfo/MSINFO32.EXE");
-    const std::string none = "lum | System Information Is Unavailable At This Time | Ok | None\n";
-    // The registered tool, the registered folder, whether starting works: what happens.
-    const std::tuple<QString, QString, bool, std::string> rows[] = {
-        {"/usr/bin/hardinfo", "msinfo", true, "start /usr/bin/hardinfo\n"},
-        {"/usr/bin/hardinfo", "", false, none + "start /usr/bin/hardinfo\n"},
-        {"", "msinfo", true, "start " + fake.root().toStdString() + "/msinfo/MSINFO32.EXE\n"},
-        {"", "gone", true, none},
-    };
-    for (const auto& [path, folder, works, did] : rows) {
-        fake.registry.values.clear();
-        if (!path.isEmpty())
-            fake.registry.set(kHkeyLocalMachine, kSysInfoPathKey, "PATH",
-                              {kRegString, path.toUtf8()});
-        if (!folder.isEmpty())
-            fake.registry.set(kHkeyLocalMachine, kSysInfoFolderKey, "MSINFO",
-                              {kRegString, (fake.root() + u'/' + folder).toUtf8() + '\0'});
-        fake.shell.succeed = works;
-        QTest::mouseClick(window->cmdSysInfo, Qt::LeftButton);
-        EXPECT_EQ(happened(), did);
-    }
-}
-
 // The texts and colours; the product name as large as fits its place; background tiles
 // all over: the top strip and the left edge show tiles only, the last ones cut. The address
 // lights up under the mouse until it moves onto the window's own surface; the links open
 // their pages; OK closes the window as the close box does, which deletes it.
-TEST_F(About, LooksHoverLinksAndOk) {
+TEST_F(About, LooksHoverLinksSystemInformationAndOk) {
     QString dump = dumpWidgetTree(*window);
     for (const QLabel* label : window->findChildren<QLabel*>())
         if (!label->text().isEmpty())
@@ -204,6 +180,28 @@ TEST_F(About, LooksHoverLinksAndOk) {
                               " v1.1.12 Question\nopen https://lum.example.org/\n"
                               "open https://www.paypal.com/xclick/business=donate%40lum.example.org"
                               "&item_name=lum.example.org&no_note=1&tax=0&currency_code=USD\n");
+    // System Information by the registered tool, the registered folder, whether starting
+    // works: what happens.
+    fake.writeFile("msinfo/MSINFO32.EXE");
+    const std::string none = "lum | System Information Is Unavailable At This Time | Ok | None\n";
+    const std::tuple<QString, QString, bool, std::string> rows[] = {
+        {"/usr/bin/hardinfo", "msinfo", true, "start /usr/bin/hardinfo\n"},
+        {"/usr/bin/hardinfo", "", false, none + "start /usr/bin/hardinfo\n"},
+        {"", "msinfo", true, "start " + fake.root().toStdString() + "/msinfo/MSINFO32.EXE\n"},
+        {"", "gone", true, none},
+    };
+    for (const auto& [path, folder, works, did] : rows) {
+        fake.registry.values.clear();
+        if (!path.isEmpty())
+            fake.registry.set(kHkeyLocalMachine, kSysInfoPathKey, "PATH",
+                              {kRegString, path.toUtf8()});
+        if (!folder.isEmpty())
+            fake.registry.set(kHkeyLocalMachine, kSysInfoFolderKey, "MSINFO",
+                              {kRegString, (fake.root() + u'/' + folder).toUtf8() + '\0'});
+        fake.shell.succeed = works;
+        QTest::mouseClick(window->cmdSysInfo, Qt::LeftButton);
+        EXPECT_EQ(happened(), did);
+    }
     QTest::mouseClick(window->cmdOK, Qt::LeftButton);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     EXPECT_TRUE(window.isNull());
@@ -308,7 +306,7 @@ TEST_F(About, StaysOpenWhileADownloadWaits) {
     Platform platform = fake.with(impatient);
     QPointer<frmAbout> busy = new frmAbout(platform, nullptr, server.base());
     busy->show();
-    server.stall("/programs/update.txt");
+    server.responses["/programs/update.txt"] = {.silent = true};
     QTimer::singleShot(50, busy, [&] { busy->close(); });
     QTest::mouseClick(busy->cmdUpdate, Qt::LeftButton);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);

@@ -2,26 +2,17 @@
 
 #include <gtest/gtest.h>
 
-namespace {
-
-// Which of the keyboard, mouse, joystick and Stelladaptor boxes can be used ("kmjs", "-"
-// for a disabled box).
-QString usableDevices(const OptionStates& s) {
-    QString letters;
-    for (std::size_t i = 0; i < 4; ++i)
-        letters += QLatin1Char(s.pcDevices[i] ? "kmjs"[i] : '-');
-    return letters;
-}
-
-} // namespace
-
 TEST(OptionRules, ThePortsDecideTheLightGunTheDevicesAndTheLayouts) {
-    const struct {
-        int left, right;
-        bool lightGun;
-        const char* devices;
-        const char* leftLayout;
-    } cases[] = {
+    // Which of the keyboard, mouse, joystick and Stelladaptor boxes can be used ("kmjs", "-"
+    // for a disabled box).
+    const auto usableDevices = [](const OptionStates& s) {
+        QString letters;
+        for (std::size_t i = 0; i < 4; ++i)
+            letters += QLatin1Char(s.pcDevices[i] ? "kmjs"[i] : '-');
+        return letters;
+    };
+    // The ports: the light gun, the usable devices, the left port's layout.
+    const std::tuple<int, int, bool, const char*, const char*> cases[] = {
         {0, 0, false, "kmjs", "Standard Control Layout"},
         {3, 3, false, "k---", "Keyboard Control Layout"},   // Keypad: keyboard only
         {12, 12, false, "----", "Standard Control Layout"}, // no controller
@@ -32,17 +23,17 @@ TEST(OptionRules, ThePortsDecideTheLightGunTheDevicesAndTheLayouts) {
         {4, 6, false, "kmjs", "Driving Control Layout"},    // Driving, CompuMate
         {-1, 5, true, "-m--", nullptr},                     // nothing selected on the left
     };
-    for (const auto& c : cases) {
+    for (const auto& [left, right, lightGun, devices, leftLayout] : cases) {
         EmulatorOptions o;
-        o.leftController = c.left;
-        o.rightController = c.right;
+        o.leftController = left;
+        o.rightController = right;
         const OptionStates s = optionStates(o);
-        SCOPED_TRACE(testing::Message() << c.left << ' ' << c.right);
-        EXPECT_EQ(s.lightGun, c.lightGun);
-        EXPECT_EQ(usableDevices(s), c.devices);
+        SCOPED_TRACE(testing::Message() << left << ' ' << right);
+        EXPECT_EQ(s.lightGun, lightGun);
+        EXPECT_EQ(usableDevices(s), devices);
         // The keyboard paddle needs a keyboard.
-        EXPECT_EQ(s.keyboardPaddle, c.devices[0] == 'k');
-        EXPECT_STREQ(s.leftLayout, c.leftLayout);
+        EXPECT_EQ(s.keyboardPaddle, devices[0] == 'k');
+        EXPECT_STREQ(s.leftLayout, leftLayout);
     }
 }
 
@@ -75,10 +66,7 @@ TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
     const LaunchGuard rateZero{"", "Video",      "txtFPScustom",
                                3,  "Zero Value", "Number Cannot Be Zero"};
     using O = EmulatorOptions;
-    const struct {
-        void (*edit)(O&);
-        std::vector<LaunchGuard> guards;
-    } cases[] = {
+    const std::pair<void (*)(O&), std::vector<LaunchGuard>> cases[] = {
         {[](O&) {}, {}},
         {[](O& o) {
              o.inactiveKeyboard = o.inactiveMouse = o.inactiveJoystick = o.inactiveStelladaptor =
@@ -102,9 +90,9 @@ TEST(OptionRules, ALaunchAsksAboutNoControllersThenStopsAtAZero) {
          },
          {noControllers, lowerZero, rateZero}},
     };
-    for (std::size_t n = 0; n < std::size(cases); ++n) {
+    for (std::size_t n = 0; const auto& [edit, guards] : cases) {
         EmulatorOptions o;
-        cases[n].edit(o);
-        EXPECT_TRUE(launchGuards(o) == cases[n].guards) << "case " << n;
+        edit(o);
+        EXPECT_TRUE(launchGuards(o) == guards) << "case " << n++;
     }
 }

@@ -49,14 +49,6 @@ bool unused(int offset) {
            (offset >= 64 && offset < 68);
 }
 
-void putInt16(QByteArray& data, int offset, qint16 value) {
-    qToLittleEndian<qint16>(value, reinterpret_cast<uchar*>(data.data()) + offset);
-}
-
-void putSingle(QByteArray& data, int offset, float value) {
-    qToLittleEndian<float>(value, reinterpret_cast<uchar*>(data.data()) + offset);
-}
-
 } // namespace
 
 // Every option at its offset, the unused bytes zero on the way out and ignored on the way
@@ -84,12 +76,12 @@ TEST(OptionSet, EveryOptionLandsAtItsOffsetAndReadsBack) {
 
 TEST(OptionSet, FlagsSelectTheLastSetButtonOrTheGroupsStart) {
     QByteArray data = encodeOptions(EmulatorOptions());
-    putInt16(data, 2, 1);              // "Default" video start, any non-zero value
-    putInt16(data, 4, qint16(0x8000)); // and "Fullscreen" after it
-    putInt16(data, 70, 7);             // keyboard paddle 1
-    putInt16(data, 96, 0);             // no frame rate button at all
+    qToLittleEndian<qint16>(1, data.data() + 2); // "Default" video start, any non-zero value
+    qToLittleEndian<qint16>(qint16(0x8000), data.data() + 4); // and "Fullscreen" after it
+    qToLittleEndian<qint16>(7, data.data() + 70);             // keyboard paddle 1
+    qToLittleEndian<qint16>(0, data.data() + 96);             // no frame rate button at all
     for (int offset = 76; offset < 84; offset += 2)
-        putInt16(data, offset, 0); // no paddle for the first mouse: "None"
+        qToLittleEndian<qint16>(0, data.data() + offset); // no paddle for the first mouse: "None"
     EmulatorOptions base;
     base.frameRate = FrameRate::Monitor;
     base.mousePaddle1 = Paddle::P2;
@@ -107,30 +99,26 @@ TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
     const float nan = std::numeric_limits<float>::quiet_NaN();
     // A check box of 3 and of -1; the last video mode, none, one past the list; an entry
     // below -1 and past the controllers and game types; a number not a number; a slider
-    // beyond 32 bits; a sound queue its hundreds do not frame.
-    const struct {
-        int offset;
-        bool bSingle;
-        float value;
-        int firstBad; // in load order, -1 for a good set
-    } cases[] = {{14, false, 3, 3},    {140, false, -1, 40}, {0, false, 8, -1},
-                 {0, false, -1, -1},   {0, false, 9, 0},     {152, false, -2, 7},
-                 {154, false, 13, 8},  {142, false, 14, 41}, {102, true, nan, 29},
-                 {60, true, 3e9f, 13}, {54, true, 12.5f, 19}};
+    // beyond 32 bits; a sound queue its hundreds do not frame. Offset, a single or not, the
+    // value: the first bad option in load order, -1 for a good set.
+    const std::tuple<int, bool, float, int> cases[] = {
+        {14, false, 3, 3},    {140, false, -1, 40}, {0, false, 8, -1},    {0, false, -1, -1},
+        {0, false, 9, 0},     {152, false, -2, 7},  {154, false, 13, 8},  {142, false, 14, 41},
+        {102, true, nan, 29}, {60, true, 3e9f, 13}, {54, true, 12.5f, 19}};
     EmulatorOptions base;
     base.player0Hard = base.player1Hard = Check::Grayed;
-    for (const auto& c : cases) {
+    for (const auto& [offset, bSingle, value, firstBad] : cases) {
         QByteArray data = encodeOptions(sampleOptions());
-        if (c.bSingle)
-            putSingle(data, c.offset, c.value);
+        if (bSingle)
+            qToLittleEndian<float>(value, data.data() + offset);
         else
-            putInt16(data, c.offset, static_cast<qint16>(c.value));
+            qToLittleEndian<qint16>(static_cast<qint16>(value), data.data() + offset);
         const OptionSetRead read = decodeOptions(data, base);
-        EXPECT_EQ(read.firstBad, c.firstBad) << c.offset;
+        EXPECT_EQ(read.firstBad, firstBad) << offset;
         EXPECT_EQ(read.status,
-                  c.firstBad < 0 ? OptionSetRead::Status::Ok : OptionSetRead::Status::Invalid)
-            << c.offset;
-        if (c.offset == 14) {
+                  firstBad < 0 ? OptionSetRead::Status::Ok : OptionSetRead::Status::Invalid)
+            << offset;
+        if (offset == 14) {
             EXPECT_EQ(read.options.dsp, sampleOptions().dsp);
             EXPECT_EQ(read.options.player1Hard, Check::Grayed);
         }
@@ -138,16 +126,13 @@ TEST(OptionSet, TheFirstBadValueEndsTheLoad) {
     // A slider takes the nearest whole number, halves to the even one.
     for (const auto& [stored, shown] : {std::pair{8.5f, 8}, {7.5f, 8}, {-0.4f, 0}}) {
         QByteArray data = encodeOptions(sampleOptions());
-        putSingle(data, 120, stored);
+        qToLittleEndian<float>(stored, data.data() + 120);
         EXPECT_EQ(decodeOptions(data, base).options.phosphor, shown) << stored;
     }
 }
 
 TEST(OptionSet, SoundQueueRangeIsCentredOnTheStoredHundreds) {
-    const struct {
-        float stored;
-        std::optional<SliderScale> scale;
-    } cases[] = {
+    const std::pair<float, std::optional<SliderScale>> cases[] = {
         {4608, SliderScale{4500, 4700, 4608}},
         // Re-centred off the scale: the end window the keys reach, the value held in it.
         {50, SliderScale{1, 201, 50}},
@@ -163,8 +148,8 @@ TEST(OptionSet, SoundQueueRangeIsCentredOnTheStoredHundreds) {
         {1e12f, std::nullopt},
         {std::numeric_limits<float>::quiet_NaN(), std::nullopt},
     };
-    for (const auto& c : cases)
-        EXPECT_EQ(soundQueueScaleFor(c.stored), c.scale) << c.stored;
+    for (const auto& [stored, scale] : cases)
+        EXPECT_EQ(soundQueueScaleFor(stored), scale) << stored;
 }
 
 TEST(OptionFile, SourcesWithoutAWholeSetApplyNothing) {
@@ -176,28 +161,20 @@ TEST(OptionFile, SourcesWithoutAWholeSetApplyNothing) {
     ASSERT_EQ(mkfifo(QFile::encodeName(fifo).constData(), 0600), 0);
     const QString locked = makeUnreadable(dir.filePath("locked.lum"), good);
     ASSERT_FALSE(locked.isEmpty());
-    const QString huge = dir.filePath("huge.lum");
-    {
-        QFile file(huge);
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(good);
-        ASSERT_TRUE(file.resize(qint64(1) << 30)); // sparse: read for its first set only
-    }
+    const QString huge = dir.filePath("huge.lum"); // sparse: read for its first set only
+    ASSERT_TRUE(putFile(huge, good) && QFile::resize(huge, qint64(1) << 30));
     using S = OptionSetRead::Status;
-    const struct {
-        QString path;
-        S status;
-    } cases[] = {
+    const std::pair<QString, S> cases[] = {
         {shortFile, S::Short},   {dir.filePath("absent.lum"), S::Unreadable},
         {locked, S::Unreadable}, {dir.path(), S::Unreadable},
         {fifo, S::Unreadable}, // a pipe would block a reader: refused unopened
         {huge, S::Ok},
     };
-    for (const auto& c : cases) {
-        const OptionSetRead read = readOptionFile(c.path, EmulatorOptions());
-        EXPECT_EQ(read.status, c.status) << qPrintable(c.path);
-        EXPECT_EQ(read.options, c.status == S::Ok ? sampleOptions() : EmulatorOptions())
-            << qPrintable(c.path);
+    for (const auto& [path, status] : cases) {
+        const OptionSetRead read = readOptionFile(path, EmulatorOptions());
+        EXPECT_EQ(read.status, status) << qPrintable(path);
+        EXPECT_EQ(read.options, status == S::Ok ? sampleOptions() : EmulatorOptions())
+            << qPrintable(path);
     }
 }
 

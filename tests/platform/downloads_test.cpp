@@ -15,12 +15,12 @@ TEST(DownloadFileTest, StoresTheWholeBodyOrKeepsTheOlderFile) {
     QtDownloader downloader{std::chrono::milliseconds(1000)};
     const QString target = dir.path() + "/file.bin";
     const QByteArray body(300000, 'x'); // several network reads
-    server.redirect("/old", server.base() + "/new");
-    server.serve("/new", body);
-    server.fail("/broken", 500);
-    server.stall("/silent");
-    server.responses["/trickle"] = {200, QByteArray(100, 'x'), {}, false, -1, true}; // 5 s
-    server.cutOff("/cut", body.left(1000), body.size());
+    server.responses["/old"] = {.status = 302, .location = (server.base() + "/new").toUtf8()};
+    server.responses["/new"] = {.body = body};
+    server.responses["/broken"] = {.status = 500};
+    server.responses["/silent"] = {.silent = true};
+    server.responses["/trickle"] = {.body = QByteArray(100, 'x'), .trickle = true}; // 5 s
+    server.responses["/cut"] = {.body = body.left(1000), .claimedLength = body.size()};
     ASSERT_TRUE(putFile(target, "older"));
     EXPECT_TRUE(downloader.DownloadFile(server.base() + "/old", target));
     EXPECT_EQ(fileBytes(target), body);

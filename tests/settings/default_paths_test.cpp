@@ -62,16 +62,14 @@ TEST(DefaultPathsRules, ArchiveNamesAndTheEmulatorsPath) {
 
 // Counting lists every folder, so a window still hidden counts when it is shown. A folder
 // not found (its disk unplugged, say) shows greyed and keeps its entry and flag.
-TEST_F(DefaultPaths, ThePageCountsFoldersWithThePatternKeepsMissingOnesAndReloadsOnItsTab) {
+TEST_F(DefaultPaths, ThePageCountsFoldersKeepsMissingOnesReloadsAndTakesOnlyAnEmulator) {
     fake.store.SaveSetting("Settings", "ROMFilter", "*.a26");
     const QString a = romFolder("a", {"x.a26", "y.a26", "z.bin"});
     const QString b = romFolder("b with blank", {"1.bin"});
     const QString gone = fake.root() + "/gone";
     const QString file = fake.writeFile("file.bin"); // a file where a folder belongs
-    storeFolder(1, a, false);
-    storeFolder(2, gone, true);
-    storeFolder(3, file, true);
-    storeFolder(4, b, true);
+    for (int n = 1; const QString& path : {a, gone, file, b})
+        storeFolder(n++, path, path != a);
     const std::vector<RomFolder> all = readRomFolders(fake.store);
     auto w = std::make_unique<frmSettings>(fake.platform);
     EXPECT_EQ(rows(*w), QStringList({a + "  off", gone + " 0 on", file + " 0 on", b + "  on"}));
@@ -99,9 +97,57 @@ TEST_F(DefaultPaths, ThePageCountsFoldersWithThePatternKeepsMissingOnesAndReload
     QTabBar* bar = control<QTabWidget>(*w, "vbalDTabControl1")->tabBar();
     QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(bar->currentIndex()).center());
     EXPECT_EQ(rows(*w)[1], fake.root() + "/c 1 on");
+
+    // The emulator path is completed, checked and stored.
+    const QString emu = fake.makeFolder("emu");
+    const QString executable = fake.writeFile("emu/z26");
+    const QString upper = fake.writeFile("other/Z26");
+    for (const QString& program : {executable, upper})
+        QFile::setPermissions(program, QFile::ReadOwner | QFile::ExeOwner);
+    auto* box = control<QLineEdit>(*w, "txtDefPathz26");
+    EXPECT_EQ(box->text(), fake.programFolder() + "/z26"); // until one is chosen
+
+    auto* choose = control<QPushButton>(*w, "cmdAddZ26Path");
+    choose->click(); // cancelled
+    EXPECT_EQ(requestLines(fake.dialogs),
+              Lines{"open | Choose z26 path | z26 executable (z26)|z26|All Files (*.*)|*.* | " +
+                    fake.programFolder().toStdString() + " | 1 | 1800"});
+    EXPECT_EQ(stored("Z26Path"), "<missing>");
+
+    fake.dialogs.paths = {emu};
+    choose->click(); // a folder is completed
+    EXPECT_EQ(box->text(), executable);
+    EXPECT_EQ(stored("Z26Path"), executable);
+    QTest::keyClicks(box, "xyz"); // typing is ignored
+    EXPECT_EQ(box->text(), executable);
+    drop(box, {QUrl::fromLocalFile(upper), QUrl::fromLocalFile(emu)}); // the emulator, any case
+    EXPECT_EQ(box->text(), upper);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
+
+    // What does not lead to a program is refused, and the stored path kept; a file that
+    // cannot be run is named. The third is a folder named like the emulator, holding
+    // another such folder; the last a z26 without its execute permission.
+    const QString refused[] = {fake.root() + "/missing",
+                               fake.makeFolder("empty"),
+                               fake.makeFolder("trap/z26/z26").chopped(4),
+                               fake.writeFile("notes.txt", "hello"),
+                               fake.root() + "/bad\nname\x01/z26",
+                               fake.writeFile("plain/z26")};
+    for (const QString& path : refused)
+        drop(box, {QUrl::fromLocalFile(path)});
+    const std::string none = "Non-z26 Folder Chosen. | z26 doesn't exist in that path. \nChoose "
+                             "another one. | Ok | None";
+    const auto noProgram = [](const QString& path) {
+        return "Not a Program | " + path.toStdString() +
+               " is not a program lum can start.\nChoose the z26 program. | Ok | Exclamation";
+    };
+    EXPECT_EQ(boxLines(fake.dialogs), (Lines{none, none, noProgram(refused[2] + "/z26"),
+                                             noProgram(refused[3]), none, noProgram(refused[5])}));
+    EXPECT_EQ(box->text(), upper);
+    EXPECT_EQ(stored("Z26Path"), upper);
 }
 
-TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
+TEST_F(DefaultPaths, FoldersAreAddedByChooserOrDropThenFlippedRefreshedAndRemoved) {
     const QString a = romFolder("a", {"1.bin"});
     const QString b = romFolder("b", {"1.bin", "2.bin"});
     auto w = open();
@@ -126,17 +172,11 @@ TEST_F(DefaultPaths, FoldersAreAddedEnabledByChooserOrDropAndTheRestRefused) {
     EXPECT_EQ(boxLines(fake.dialogs),
               (Lines{"lum | " + a.toStdString() + " is already in the list. | Ok | Information",
                      notAFolder, notAFolder, "lum | .rar files aren't supported yet | Ok | None"}));
-    EXPECT_EQ(rows(*w).size(), 2);
-}
+    fake.dialogs.boxes.clear();
 
-TEST_F(DefaultPaths, TheListsKeysAndMenuFlipRefreshAndRemoveFolders) {
-    const QString a = romFolder("a", {"1.bin"});
-    const QString b = romFolder("b");
-    storeFolder(1, a, true);
-    storeFolder(2, b, true);
-    auto w = open();
     QTreeWidget* paths = list(*w);
     // Enter flips the selected folder and stores it at once, for the main list's next refresh.
+    selectRow(*w, -1);
     QTest::keyClick(paths, Qt::Key_Return); // no selected row: nothing
     selectRow(*w, 1);
     QTest::keyClick(paths, Qt::Key_Return);
@@ -144,7 +184,7 @@ TEST_F(DefaultPaths, TheListsKeysAndMenuFlipRefreshAndRemoveFolders) {
     selectRow(*w, 0);
     QTest::keyClick(paths, Qt::Key_Enter);
     EXPECT_EQ(stored("ROMChecked"), "False");
-    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", b + " 0 off"}));
+    EXPECT_EQ(rows(*w), QStringList({a + " 1 off", b + " 2 off"}));
 
     fake.writeFile("a/2.bin");
     QTest::keyClick(paths, Qt::Key_F5);
@@ -176,62 +216,11 @@ TEST_F(DefaultPaths, TheListsKeysAndMenuFlipRefreshAndRemoveFolders) {
     EXPECT_EQ(boxLines(fake.dialogs), Lines(3, ("Remove Path? | Are you sure you want to remove " +
                                                 a + " from the list? | YesNoCancel | Question")
                                                    .toStdString()));
-    EXPECT_EQ(rows(*w), QStringList({b + " 0 off"}));
+    EXPECT_EQ(rows(*w), QStringList({b + " 2 off"}));
     EXPECT_EQ(QStringList({stored("ROMPath"), stored("ROMChecked"), stored("ROM2Path")}),
               QStringList({b, "False", ""}));
     // Removing the only folder leaves no ROM path at all.
     selectRow(*w, 0);
     remove->trigger();
     EXPECT_EQ(stored("ROMPath"), "");
-}
-
-TEST_F(DefaultPaths, TheEmulatorPathIsCompletedCheckedAndStored) {
-    const QString emu = fake.makeFolder("emu");
-    const QString executable = fake.writeFile("emu/z26");
-    const QString upper = fake.writeFile("other/Z26");
-    for (const QString& program : {executable, upper})
-        QFile::setPermissions(program, QFile::ReadOwner | QFile::ExeOwner);
-    auto w = open();
-    auto* box = control<QLineEdit>(*w, "txtDefPathz26");
-    EXPECT_EQ(box->text(), fake.programFolder() + "/z26"); // until one is chosen
-
-    auto* choose = control<QPushButton>(*w, "cmdAddZ26Path");
-    choose->click(); // cancelled
-    EXPECT_EQ(requestLines(fake.dialogs),
-              Lines{"open | Choose z26 path | z26 executable (z26)|z26|All Files (*.*)|*.* | " +
-                    fake.programFolder().toStdString() + " | 1 | 1800"});
-    EXPECT_EQ(stored("Z26Path"), "<missing>");
-
-    fake.dialogs.paths = {emu};
-    choose->click(); // a folder is completed
-    EXPECT_EQ(box->text(), executable);
-    EXPECT_EQ(stored("Z26Path"), executable);
-    QTest::keyClicks(box, "xyz"); // typing is ignored
-    EXPECT_EQ(box->text(), executable);
-    drop(box, {QUrl::fromLocalFile(upper), QUrl::fromLocalFile(emu)}); // the emulator, any case
-    EXPECT_EQ(box->text(), upper);
-    EXPECT_TRUE(fake.dialogs.boxes.empty());
-    EXPECT_EQ(control<QLineEdit>(*open(), "txtDefPathz26")->text(), upper);
-
-    // What does not lead to a program is refused, and the stored path kept; a file that
-    // cannot be run is named. The third is a folder named like the emulator, holding
-    // another such folder; the last a z26 without its execute permission.
-    const QString refused[] = {fake.root() + "/missing",
-                               fake.makeFolder("empty"),
-                               fake.makeFolder("trap/z26/z26").chopped(4),
-                               fake.writeFile("notes.txt", "hello"),
-                               fake.root() + "/bad\nname\x01/z26",
-                               fake.writeFile("plain/z26")};
-    for (const QString& path : refused)
-        drop(box, {QUrl::fromLocalFile(path)});
-    const std::string none = "Non-z26 Folder Chosen. | z26 doesn't exist in that path. \nChoose "
-                             "another one. | Ok | None";
-    const auto noProgram = [](const QString& path) {
-        return "Not a Program | " + path.toStdString() +
-               " is not a program lum can start.\nChoose the z26 program. | Ok | Exclamation";
-    };
-    EXPECT_EQ(boxLines(fake.dialogs), (Lines{none, none, noProgram(refused[2] + "/z26"),
-                                             noProgram(refused[3]), none, noProgram(refused[5])}));
-    EXPECT_EQ(box->text(), upper);
-    EXPECT_EQ(stored("Z26Path"), upper);
 }

@@ -1,6 +1,7 @@
 #include "SettingsFixture.h"
 
 #include "support/Files.h"
+#include "support/SampleOptions.h"
 
 #include "emulator/OptionFile.h"
 
@@ -22,7 +23,7 @@ protected:
 
 } // namespace
 
-TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
+TEST_F(OptionSetButtons, AskForAFileReportAddTheExtensionAndNeverLoseAFile) {
     auto w = open();
     w->showConfigStatus("before", "tip");
     // The choosers open in the user's folder, made if missing, where Default.lum starts lum.
@@ -39,16 +40,12 @@ TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     EXPECT_TRUE(QFileInfo(fake.platform.userFolder).isDir());
     EXPECT_EQ(control<QLabel>(*w, "lblConfig")->textFormat(), Qt::PlainText); // names as typed
 
-    // The name as chosen in the status line; ".lum" added unless the name ends in it.
+    // The name as chosen in the status line, the file with ".lum" added.
     control<QRadioButton>(*w, "optCPPAL")->click();
-    for (const auto& [chosen, written] :
-         {std::pair{"name", "name.lum"}, {"NAME.LUM", "NAME.LUM"}}) {
-        save(*w, fake.root() + "/" + chosen);
-        EXPECT_EQ(fileBytes(fake.root() + "/" + written), encodeOptions(w->options())) << chosen;
-        EXPECT_EQ(status(*w), QString(chosen) + " was succesfully saved");
-    }
+    save(*w, fake.root() + "/name");
+    EXPECT_EQ(fileBytes(fake.root() + "/name.lum"), encodeOptions(w->options()));
+    EXPECT_EQ(status(*w), "name was succesfully saved");
     EXPECT_EQ(control<QLabel>(*w, "lblConfig")->toolTip(), "");
-    EXPECT_FALSE(QFile::exists(fake.root() + "/name"));
 
     auto other = open();
     fake.dialogs.paths = {fake.root() + "/name.lum"};
@@ -58,6 +55,37 @@ TEST_F(OptionSetButtons, AskForAFileReportAndAddTheExtension) {
     EXPECT_TRUE(control<QRadioButton>(*other, "optCPPAL")->isChecked());
     EXPECT_TRUE(fake.dialogs.boxes.empty());
     EXPECT_FALSE(other->isHidden()); // a good load leaves the window as it was
+
+    // Saving never loses a file.
+    save(*w, fake.root() + "/no such folder/set");
+    EXPECT_EQ(status(*w), "error saving set");
+    // From the main menu a box names the file and why.
+    fake.dialogs.paths = {fake.root() + "/no such folder/set"};
+    w->saveOptionSetFromMenu();
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines{"lum | " + fake.root().toStdString() +
+                    "/no such folder/set.lum could not be saved:\nNo such file or directory | Ok | "
+                    "Exclamation"});
+    fake.dialogs.boxes.clear();
+
+    const QString older = fake.root() + "/older.lum";
+    ASSERT_TRUE(putFile(older, QByteArray(172, '\x11')));
+
+    // A name the extension was added to does not replace a file unasked.
+    w->showConfigStatus("before", {});
+    fake.dialogs.answers = {MsgResult::No, MsgResult::Yes};
+    save(*w, fake.root() + "/older");
+    EXPECT_EQ(fileBytes(older), QByteArray(172, '\x11'));
+    EXPECT_EQ(status(*w), "before");
+    save(*w, fake.root() + "/older");
+    EXPECT_EQ(fileBytes(older), encodeOptions(w->options()));
+    EXPECT_EQ(status(*w), "older was succesfully saved");
+    EXPECT_EQ(boxLines(fake.dialogs),
+              Lines(2, "Choose File to Save Configuration | older.lum already exists.\r\nDo you "
+                       "want to replace it? | YesNo | Exclamation"));
+    // A name chosen with its extension was asked about by the chooser itself.
+    save(*w, older);
+    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
 }
 
 TEST_F(OptionSetButtons, ACorruptSetIsReportedWithWhatCameBeforeTheBadValueShown) {
@@ -93,55 +121,13 @@ TEST_F(OptionSetButtons, ACorruptSetIsReportedWithWhatCameBeforeTheBadValueShown
               "missing.lum is corrupt.  Plese verify settings an re-save to correct the problem");
 }
 
-TEST_F(OptionSetButtons, SavingNeverLosesAFile) {
-    auto w = open();
-    save(*w, fake.root() + "/no such folder/set");
-    EXPECT_EQ(status(*w), "error saving set");
-    // From the main menu a box names the file and why.
-    fake.dialogs.paths = {fake.root() + "/no such folder/set"};
-    w->saveOptionSetFromMenu();
-    EXPECT_EQ(boxLines(fake.dialogs),
-              Lines{"lum | " + fake.root().toStdString() +
-                    "/no such folder/set.lum could not be saved:\nNo such file or directory | Ok | "
-                    "Exclamation"});
-    fake.dialogs.boxes.clear();
-
-    const QString older = fake.root() + "/older.lum";
-    ASSERT_TRUE(putFile(older, QByteArray(172, '\x11')));
-
-    // A name the extension was added to does not replace a file unasked.
-    w->showConfigStatus("before", {});
-    fake.dialogs.answers = {MsgResult::No, MsgResult::Yes};
-    save(*w, fake.root() + "/older");
-    EXPECT_EQ(fileBytes(older), QByteArray(172, '\x11'));
-    EXPECT_EQ(status(*w), "before");
-    save(*w, fake.root() + "/older");
-    EXPECT_EQ(fileBytes(older), encodeOptions(EmulatorOptions()));
-    EXPECT_EQ(status(*w), "older was succesfully saved");
-    EXPECT_EQ(boxLines(fake.dialogs),
-              Lines(2, "Choose File to Save Configuration | older.lum already exists.\r\nDo you "
-                       "want to replace it? | YesNo | Exclamation"));
-    // A name chosen with its extension was asked about by the chooser itself.
-    save(*w, older);
-    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
-}
-
 // data/Default.lum is the option set of the settings window as it starts, written by the
 // window's own save. When the start state or the file's layout changes, its test fails;
 // run it once with LUM_UPDATE_DEFAULT_LUM=1 to write the new file, then commit it.
-namespace {
-
-using DefaultLum = SettingsFixture;
-
-} // namespace
-
-TEST_F(DefaultLum, IsTheStartStateOfTheSettingsWindow) {
+TEST_F(OptionSetButtons, DefaultLumIsTheStartStateOfTheWindow) {
     frmSettings w(fake.platform);
-    const QString path = fake.root() + "/start.lum";
-    fake.dialogs.paths.push_back(path);
-    w.cmdSaveDat_Click();
-    const QByteArray produced = fileBytes(path);
-    ASSERT_EQ(produced.size(), 172);
+    save(w, fake.root() + "/start.lum");
+    const QByteArray produced = fileBytes(fake.root() + "/start.lum");
     const QString committed = sourcePath("data/Default.lum");
     if (!qgetenv("LUM_UPDATE_DEFAULT_LUM").isEmpty()) {
         ASSERT_TRUE(putFile(committed, produced));
@@ -150,11 +136,7 @@ TEST_F(DefaultLum, IsTheStartStateOfTheSettingsWindow) {
         << "data/Default.lum is out of date: run this test with LUM_UPDATE_DEFAULT_LUM=1";
 
     // And it loads back every option as the window starts.
-    EmulatorOptions changed;
-    changed.quiet = Check::On;
-    changed.palette = Palette::Pal;
-    changed.paddleSensitivity = 3;
-    w.setOptions(changed);
+    w.setOptions(sampleOptions());
     ASSERT_TRUE(w.LoadSettings(committed));
     EmulatorOptions start;
     start.customFrameRate = "0"; // a set keeps numbers, so the empty rate comes back as 0
@@ -162,7 +144,7 @@ TEST_F(DefaultLum, IsTheStartStateOfTheSettingsWindow) {
     EXPECT_TRUE(fake.dialogs.boxes.empty());
 }
 
-TEST_F(DefaultLum, ControllerPicturesLieBesideItUnderTheNamesTheButtonsUse) {
+TEST_F(OptionSetButtons, ControllerPicturesLieBesideDefaultLumUnderTheNamesTheButtonsUse) {
     for (const char* caption : {"Standard Control Layout", "Paddle Control Layout",
                                 "Keyboard Control Layout", "Driving Control Layout"}) {
         QImageReader reader(sourcePath("data") + frmSettings::GetPicName(caption));

@@ -25,28 +25,23 @@ protected:
 
 TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensInPlace) {
     // (Every shape of a file that is no picture is read by the picture loader's own test.)
-    const QString bad[] = {fake.programFolder() + "/missing.jpg",
-                           fake.writeFile("program/empty.jpg"),
-                           fake.programFolder() + "/"}; // a caption that names no layout
+    const QString bad = fake.writeFile("program/empty.jpg");
     QPointer<frmPicPreview> preview = new frmPicPreview(fake.platform);
     EXPECT_EQ(place(preview), QRect(twips::toPixelsX(300), twips::toPixelsY(300),
                                     twips::toPixelsX(11115), twips::toPixelsY(5655)));
-    for (const QString& path : bad)
-        EXPECT_FALSE(preview->showPicture(path, "Paddle Control Layout")) << qPrintable(path);
-    EXPECT_EQ(boxLines(fake.dialogs), Lines(std::size(bad), kError));
+    EXPECT_FALSE(preview->showPicture(bad, "Paddle Control Layout"));
+    EXPECT_EQ(boxLines(fake.dialogs), Lines{kError});
     EXPECT_FALSE(preview->isVisible());
 
     preview->resize(400, 300);
-    const struct {
-        QSize picture;
-        QRect image;
-    } cases[] = {{{400, 100}, {0, 100, 400, 100}}, // wider: the whole width
-                 {{100, 500}, {170, 0, 60, 300}},  // taller: the whole height
-                 {{800, 600}, {0, 0, 400, 300}}};
-    for (const auto& c : cases) {
-        const QString path = picture("a.jpg", c.picture.width(), c.picture.height());
+    const std::pair<QSize, QRect> cases[] = {
+        {{400, 100}, {0, 100, 400, 100}}, // wider: the whole width
+        {{100, 500}, {170, 0, 60, 300}},  // taller: the whole height
+        {{800, 600}, {0, 0, 400, 300}}};
+    for (const auto& [size, image] : cases) {
+        const QString path = picture("a.jpg", size.width(), size.height());
         ASSERT_TRUE(preview->showPicture(path, "Paddle Control Layout"));
-        EXPECT_EQ(preview->PPImg->geometry(), c.image);
+        EXPECT_EQ(preview->PPImg->geometry(), image);
     }
     EXPECT_TRUE(preview->PPImg->isVisible() && !preview->PPPic->isVisible());
     preview->resize(600, 300);
@@ -54,11 +49,11 @@ TEST_F(PicturePreview, FitsThePictureKeepsItWhenANewOneCannotBeLoadedAndReopensI
     EXPECT_EQ(preview->PPImg->geometry(), QRect(100, 0, 400, 300));
 
     // A bad picture leaves the open window as it was, and says so.
-    EXPECT_FALSE(preview->showPicture(bad[1], "Keyboard Control Layout"));
+    EXPECT_FALSE(preview->showPicture(bad, "Keyboard Control Layout"));
     EXPECT_EQ(shown(preview),
               "Paddle Control Layout " + fake.programFolder().toStdString() + "/a.jpg");
     EXPECT_EQ(preview->PPPic->size(), QSize(800, 600));
-    EXPECT_EQ(fake.dialogs.boxes.size(), std::size(bad) + 1);
+    EXPECT_EQ(fake.dialogs.boxes.size(), 2u);
 
     preview->move(twips::toPixelsX(900), twips::toPixelsY(600));
     QCoreApplication::processEvents();
@@ -90,13 +85,10 @@ TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {
     auto w = open();
     auto* left = control<QPushButton>(*w, "cmdLeftControlPic");
     auto* right = control<QPushButton>(*w, "cmdRightControlPic");
-    left->click(); // no picture file yet
-    EXPECT_EQ(boxLines(fake.dialogs), Lines{kError});
     picture("lum Paddles.jpg", 40, 20);
     picture("lum Driving.jpg", 40, 20);
     control<QComboBox>(*w, "comboLeftController")->setCurrentIndex(2);  // Paddle Controller
     control<QComboBox>(*w, "comboRightController")->setCurrentIndex(4); // Driving Controller
-    EXPECT_EQ(left->text() + ", " + right->text(), "Paddle Control Layout, Driving Control Layout");
     const std::string folder = fake.programFolder().toStdString();
     QTest::mouseClick(left, Qt::LeftButton);
     const QPointer<frmPicPreview> preview = w->findChild<frmPicPreview*>();
@@ -112,5 +104,5 @@ TEST_F(PicturePreview, EachPortButtonShowsTheLayoutOfItsController) {
     QTest::mouseClick(left, Qt::LeftButton);
     const frmPicPreview* next = w->findChild<frmPicPreview*>();
     EXPECT_TRUE(next && next->isVisible());
-    EXPECT_EQ(fake.dialogs.boxes.size(), 1u);
+    EXPECT_TRUE(fake.dialogs.boxes.empty());
 }

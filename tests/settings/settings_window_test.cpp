@@ -17,7 +17,11 @@ TEST_F(SettingsWindow, StartsAsTheGoldenDumpShows) {
 }
 
 // The window is the side strip, which names the page shown, and the tab control beside it.
-TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
+// Closing it hides it; Unload saves its place.
+TEST_F(SettingsWindow, PagesAreChosenByKeyClosingHidesAndUnloadSavesThePlace) {
+    fake.store.SaveSetting("setpos", "top", "1500");
+    storeFolder(1, romFolder("a"), true);
+    storeFolder(3, romFolder("c"), true); // behind a gap
     auto w = open();
     ASSERT_TRUE(QTest::qWaitForWindowExposed(w.get()));
     const int draws = w->Logo().drawCount();
@@ -30,7 +34,8 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
     w->selectPage("Nowhere");
     EXPECT_EQ(w->selectedPage(), "Debug");
 
-    const QRect tab = control<QTabWidget>(*w, "vbalDTabControl1")->geometry();
+    const auto* tabs = control<QTabWidget>(*w, "vbalDTabControl1");
+    const QRect tab = tabs->geometry();
     const QWidget* strip = control<PictureBox>(*w, "picSideText");
     // No band around the tab control: Qt's size has no title bar or borders in it.
     EXPECT_EQ(QRect(tab.topLeft(), w->size()),
@@ -38,20 +43,11 @@ TEST_F(SettingsWindow, PagesAreChosenByKeyAndNamedInTheSideStrip) {
     EXPECT_TRUE(tab.width() >= twips::toPixelsX(6495) && tab.height() >= twips::toPixelsY(4095));
     EXPECT_EQ(strip->height(), w->height());
     // Every tab shows without scrolling the tab bar.
-    EXPECT_LE(control<QTabWidget>(*w, "vbalDTabControl1")->tabBar()->sizeHint().width(),
-              tab.width());
+    EXPECT_LE(tabs->tabBar()->sizeHint().width(), tab.width());
     // The hidden balloon anchor lies over the control its tip is about.
     EXPECT_EQ(control<QLineEdit>(*w, "txtVidModeBalloon")->geometry(),
               control<QComboBox>(*w, "comboVideoMode")->geometry());
-}
 
-TEST_F(SettingsWindow, ClosingHidesKeepingTheOptionsAndUnloadSavesThePlace) {
-    fake.store.SaveSetting("setpos", "top", "1500");
-
-    storeFolder(1, romFolder("a"), true);
-    storeFolder(3, romFolder("c"), true); // behind a gap
-    auto w = open();
-    ASSERT_TRUE(QTest::qWaitForWindowExposed(w.get()));
     control<QCheckBox>(*w, "chkBW")->click();
     w->move(twips::toPixelsX(2400), twips::toPixelsY(1200));
     EXPECT_FALSE(w->close());

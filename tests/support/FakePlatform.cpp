@@ -12,16 +12,15 @@ MsgResult FakeDialogs::MsgBox(QWidget*, const QString& text, MsgButtons buttons,
 }
 
 FakePlatform::FakePlatform()
-    : store(m_dir.path() + QStringLiteral("/config/lum/lum.ini")),
-      platform{store,
-               dialogs,
-               shell,
-               m_dir.path() + QStringLiteral("/program"),
-               network,
-               registry,
-               m_dir.path() + QStringLiteral("/config/lum"),
-               m_dir.path() + QStringLiteral("/cache/lum"),
-               m_dir.path() + QStringLiteral("/data/lum")} {
+    : store(iniPath()), platform{store,
+                                 dialogs,
+                                 shell,
+                                 programFolder(),
+                                 network,
+                                 registry,
+                                 root() + "/config/lum",
+                                 root() + "/cache/lum",
+                                 root() + "/data/lum"} {
     QDir().mkpath(programFolder());
 }
 

@@ -133,27 +133,12 @@ public:
     // Makes a folder under the temporary folder; returns its path.
     QString makeFolder(const QString& relativePath) const;
     // The same platform with a real shell or another downloader in it.
-    Platform with(Shell& other) {
-        return {store,
-                dialogs,
-                other,
-                platform.programFolder,
-                network,
-                registry,
-                platform.userFolder,
-                platform.cacheFolder,
-                platform.dataFolder};
-    }
-    Platform with(Downloader& other) {
-        return {store,
-                dialogs,
-                shell,
-                platform.programFolder,
-                other,
-                registry,
-                platform.userFolder,
-                platform.cacheFolder,
-                platform.dataFolder};
+    Platform with(Shell& other) { return with(other, network); }
+    Platform with(Downloader& other) { return with(shell, other); }
+    Platform with(Shell& otherShell, Downloader& otherNetwork) {
+        const Platform& p = platform;
+        return {p.store,    p.dialogs,    otherShell,    p.programFolder, otherNetwork,
+                p.registry, p.userFolder, p.cacheFolder, p.dataFolder};
     }
     // A fresh store read back from the INI file, as the next start would see it.
     std::unique_ptr<IniSettingsStore> reopenStore() const;

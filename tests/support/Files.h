@@ -70,11 +70,9 @@ private:
     void (*m_oldHandler)(int) = nullptr;
 };
 
-// A file that exists but cannot be read; returns its path, or the empty text when it could
-// not be made. Any file already there is replaced. For an ordinary user it is `content`
-// with no permission bits. Root reads through any permission bits, so for root a link to
-// /proc/self/mem stands in: it opens like a regular file, and every read at its start
-// fails (EIO).
+// A file that exists but cannot be read, replacing any there; its path, or "" when it could
+// not be made. For an ordinary user `content` without permission bits; root reads through
+// those, so a link to /proc/self/mem stands in: it opens, and every read at its start fails.
 inline QString makeUnreadable(const QString& path, const QByteArray& content = {}) {
     QFile::remove(path);
     if (geteuid() == 0)
@@ -86,11 +84,9 @@ inline QString makeUnreadable(const QString& path, const QByteArray& content = {
     return QFile::setPermissions(path, {}) ? path : QString();
 }
 
-// While it lives, the calling thread has no power to pass over permission bits: a file or
-// folder without them refuses root as it refuses anyone (open and opendir fail with
-// EACCES), so tests of unreadable files and folders run as root too. It drops only the
-// thread's effective capabilities that override read and search permissions, and gives
-// them back when it ends; for other users it does nothing.
+// While it lives, the calling thread cannot pass over permission bits, so that a file or
+// folder without them refuses root too: it drops the thread's effective capabilities that
+// override read and search permissions, and gives them back when it ends.
 class NoPermissionOverride {
 public:
     NoPermissionOverride() {
@@ -108,8 +104,7 @@ public:
     NoPermissionOverride(const NoPermissionOverride&) = delete;
     NoPermissionOverride& operator=(const NoPermissionOverride&) = delete;
 
-    // False when root kept its override (the capabilities could not be changed): a test
-    // that needs a refused read must then skip.
+    // False when root kept its override: a test that needs a refused read must then skip.
     bool holds() const { return geteuid() != 0 || m_lowered; }
 
 private:

@@ -16,9 +16,9 @@ class LocalHttpServer {
 public:
     struct Response {
         int status = 200;
-        QByteArray body;
-        QByteArray location; // sent as the Location header when not empty
-        bool silent = false; // accept the request and never answer
+        QByteArray body{};
+        QByteArray location{}; // sent as the Location header when not empty
+        bool silent = false;   // accept the request and never answer
         // When set, the length announced in the headers; the connection then closes after
         // `body`, as when a transfer is cut off.
         qsizetype claimedLength = -1;
@@ -47,18 +47,6 @@ public:
     QString base() const {
         return QStringLiteral("http://127.0.0.1:%1").arg(m_server.serverPort());
     }
-    void serve(const QString& path, const QByteArray& body) {
-        responses[path] = {200, body, {}, false};
-    }
-    void redirect(const QString& path, const QString& target) {
-        responses[path] = {302, {}, target.toUtf8(), false};
-    }
-    void fail(const QString& path, int status) { responses[path] = {status, {}, {}, false}; }
-    void stall(const QString& path) { responses[path] = {200, {}, {}, true}; }
-    // Announces `claimed` bytes, sends `body` and hangs up.
-    void cutOff(const QString& path, const QByteArray& body, qsizetype claimed) {
-        responses[path] = {200, body, {}, false, claimed};
-    }
 
     // An address on which nothing listens, so connecting is refused.
     static QString refusedBase() {
@@ -78,7 +66,7 @@ private:
         requests << path;
         const auto found = responses.find(path);
         const Response response =
-            found != responses.end() ? found->second : Response{404, "none", {}, false, -1};
+            found != responses.end() ? found->second : Response{.status = 404, .body = "none"};
         if (response.silent)
             return;
         const qsizetype length =

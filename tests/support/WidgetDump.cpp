@@ -7,9 +7,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdio>
-#include <cstdlib>
-
 namespace {
 
 QString quoted(const QString& text) {
@@ -127,9 +124,7 @@ QObject* findControl(const QObject& window, const QString& name, const char* cla
         if (object->inherits(className))
             return object;
     // A missing control would only crash the test further on; say which one and stop.
-    std::fprintf(stderr, "no %s %s in %s\n", className, qPrintable(name),
-                 qPrintable(window.objectName()));
-    std::abort();
+    qFatal("no %s %s in %s", className, qPrintable(name), qPrintable(window.objectName()));
 }
 
 QString sourcePath(const QString& relative) {
