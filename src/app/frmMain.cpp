@@ -33,6 +33,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
+#include <QTimer>
 
 #include <climits>
 #include <cmath>
@@ -78,6 +79,13 @@ void frmMain::createControls() {
     vbalProgressBar1->hide();
 
     txtSearch->installEventFilter(this);
+    tmrSearch = new QTimer(this);
+    tmrSearch->setObjectName(QStringLiteral("tmrSearch"));
+    tmrSearch->setSingleShot(true);
+    tmrSearch->setInterval(20);
+    connect(tmrSearch, &QTimer::timeout, this, &frmMain::tmrSearch_Timer);
+    // Also the operators that Ctrl+A, Ctrl+O and Ctrl+N insert.
+    connect(txtSearch, &QLineEdit::textChanged, this, &frmMain::txtSearch_Change);
     connect(vbalListViewCtl1, &ListView::keyDown, this, &frmMain::vbalListViewCtl1_KeyDown);
     connect(vbalListViewCtl1, &ListView::mouseDown, this, &frmMain::vbalListViewCtl1_MouseDown);
     connect(vbalListViewCtl1, &ListView::popupKey, this, &frmMain::showRowPopup);
@@ -156,6 +164,9 @@ void frmMain::createMenus() {
     separator(mnuBackImg, "mnuBar2");
     mnuBackImgEnabled = item(mnuBackImg, "mnuBackImgEnabled", "Background Image &Enabled");
     mnuBackImgEnabled->setCheckable(true);
+    separator(mnuSettings, "mnuBar5");
+    mnuSearchAsYouType = item(mnuSettings, "mnuSearchAsYouType", "Search &As You Type");
+    mnuSearchAsYouType->setCheckable(true);
 
     mnuAbout = menu(menuBar()->addMenu(QStringLiteral("&About")), "mnuAbout");
     mnuAboutz26Readme = item(mnuAbout, "mnuAboutz26Readme", "z26 &Readme");
@@ -180,6 +191,7 @@ void frmMain::createMenus() {
     connect(mnuTextColor, &QAction::triggered, this, &frmMain::mnuTextColor_Click);
     connect(mnuBackImgChange, &QAction::triggered, this, &frmMain::mnuBackImgChange_Click);
     connect(mnuBackImgEnabled, &QAction::triggered, this, &frmMain::mnuBackImgEnabled_Click);
+    connect(mnuSearchAsYouType, &QAction::triggered, this, &frmMain::mnuSearchAsYouType_Click);
     connect(mnuAboutz26Readme, &QAction::triggered, this, &frmMain::mnuAboutz26Readme_Click);
     connect(mnuAboutCopying, &QAction::triggered, this, &frmMain::mnuAboutCopying_Click);
     connect(mnuAboutz26HomePage, &QAction::triggered, this, &frmMain::mnuAboutz26HomePage_Click);
@@ -268,6 +280,7 @@ void frmMain::Form_Load() {
                                                                 : QString());
     vbalListViewCtl1->setForeColor(read(store, stored::textColor));
     ApplyBackground();
+    mnuSearchAsYouType->setChecked(read(store, stored::searchAsYouType));
 
     const QString z26Path = storedOrFoundZ26Path();
     const bool bRomPath = !readRomFolders(store).empty();
@@ -351,6 +364,7 @@ void frmMain::RefreshMainList() {
         addListColumns();
     const SettingsStore& store = m_platform.store;
     const QString search = txtSearch->text().trimmed();
+    tmrSearch->stop(); // the refresh applies the same search
 
     // The first load's listing is already under way on another core, so its caption is
     // painted while that listing finishes rather than after it.
@@ -519,6 +533,21 @@ void frmMain::txtSearch_DblClick() {
     tip.ShowBalloonTip();
 }
 
+void frmMain::txtSearch_Change() {
+    if (mnuSearchAsYouType->isChecked())
+        tmrSearch->start();
+}
+
+void frmMain::tmrSearch_Timer() {
+    std::optional<RomRows> rows = m_catalogue.narrow(txtSearch->text().trimmed());
+    if (!rows)
+        return; // nothing listed yet
+    const qint64 listed = rows->listed;
+    m_listModel->setRows(std::move(rows->folders), std::move(rows->names),
+                         std::move(rows->rowFolders));
+    setWindowTitle(refreshCaption(false, m_listModel->rowCount(), listed));
+}
+
 void frmMain::vbalListViewCtl1_KeyDown(int key) {
     if (key == Qt::Key_F5)
         RefreshMainList();
@@ -612,6 +641,12 @@ void frmMain::mnuBackImgEnabled_Click() {
                                                                 : QString());
     write(store, stored::backImgEnabled, mnuBackImgEnabled->isChecked());
     ApplyBackground();
+}
+
+void frmMain::mnuSearchAsYouType_Click() {
+    write(m_platform.store, stored::searchAsYouType, mnuSearchAsYouType->isChecked());
+    if (!mnuSearchAsYouType->isChecked())
+        tmrSearch->stop();
 }
 
 void frmMain::ApplyBackground() {

@@ -23,6 +23,7 @@ class QGroupBox;
 class QLabel;
 class QLineEdit;
 class QMenu;
+class QTimer;
 class CCRC32;
 class RomListModel;
 class vbalProgressBar;
@@ -77,6 +78,8 @@ private:
     QLineEdit* txtSearch = nullptr;
     vbalProgressBar* vbalProgressBar1 = nullptr;
     QLabel* picBack = nullptr;
+    // Narrows the list a moment after the last key, so that a burst of keys costs one pass.
+    QTimer* tmrSearch = nullptr;
 
     QMenu* mnuFile = nullptr;
     QAction* mnuFileLoadSettings = nullptr;
@@ -90,6 +93,7 @@ private:
     QAction* mnuBackImgChange = nullptr;
     QAction* mnuBackColorChange = nullptr;
     QAction* mnuBackImgEnabled = nullptr;
+    QAction* mnuSearchAsYouType = nullptr;
     QMenu* mnuAbout = nullptr;
     QAction* mnuAboutz26Readme = nullptr;
     QAction* mnuAboutCopying = nullptr;
@@ -106,6 +110,10 @@ private:
     // operator at the caret; a double-click shows the search help.
     bool txtSearch_KeyPress(int key, Qt::KeyboardModifiers modifiers);
     void txtSearch_DblClick();
+    void txtSearch_Change();
+    // Narrows the list to what the search box matches among the rows the last refresh
+    // listed, without reading a folder.
+    void tmrSearch_Timer();
     void vbalListViewCtl1_KeyDown(int key);
     void vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos);
     // The row popup at a place on the screen, with Game Info when the row is known.
@@ -132,6 +140,7 @@ private:
     void mnuTextColor_Click();
     void mnuBackImgChange_Click();
     void mnuBackImgEnabled_Click();
+    void mnuSearchAsYouType_Click();
     // The list's colours and picture on the bars that follow them: the refresh's progress
     // bar and the settings window's slider bars.
     void ApplyBackground();

@@ -28,6 +28,8 @@ public:
 
     QStringList toStringList() const;
 
+    bool operator==(const NameList&) const = default;
+
 private:
     std::vector<char16_t> m_chars;
     std::vector<size_t> m_ends;

@@ -5,6 +5,43 @@
 
 #include <algorithm>
 
+namespace {
+
+// The rows of `all` that `search` matches, in their order; `progress`, when given, is called
+// as the refresh promises.
+RomRows keepMatches(const RomRows& all, const QString& search, const RefreshProgress& progress) {
+    const qint64 total = all.listed;
+    if (progress)
+        progress(0, total);
+    RomRows rows;
+    rows.folders = all.folders;
+    rows.listed = total;
+    if (search.isEmpty()) {
+        rows.names = all.names;
+        rows.rowFolders = all.rowFolders;
+    } else {
+        const SearchExpression expression(search);
+        const qint64 stride = std::max<qint64>(1, total / 1000);
+        qint64 nextReport = stride;
+        for (qsizetype i = 0; i < total; ++i) {
+            const QStringView name = all.names.at(i);
+            if (expression.matches(name)) {
+                rows.names.append(name);
+                rows.rowFolders.push_back(all.rowFolders[static_cast<size_t>(i)]);
+            }
+            if (progress && i + 1 == nextReport) {
+                progress(i + 1, total);
+                nextReport += stride;
+            }
+        }
+    }
+    if (progress)
+        progress(total, total);
+    return rows;
+}
+
+} // namespace
+
 RomCatalogue::~RomCatalogue() {
     dropPrefetch();
 }
@@ -41,41 +78,23 @@ RomRows RomCatalogue::refresh(const QStringList& folders, const QString& pattern
             whileListing();
     }
     std::vector<Listing> listings = m_prefetch.get();
-    RomRows rows;
-    for (const Listing& listing : listings)
-        rows.listed += listing.names.size();
-
-    const qint64 total = rows.listed;
-    const qint64 stride = std::max<qint64>(1, total / 1000);
-    qint64 done = 0;
-    qint64 nextReport = stride;
-    progress(0, total);
-    const SearchExpression expression(search);
+    RomRows all;
     for (Listing& listing : listings) {
-        const int folderIndex = static_cast<int>(rows.folders.size());
-        rows.folders.push_back(listing.folder);
-        const qsizetype count = listing.names.size();
-        if (search.isEmpty()) {
-            // Every name is a row, so the folder's names are taken whole.
-            rows.rowFolders.insert(rows.rowFolders.end(), static_cast<size_t>(count), folderIndex);
-            rows.names.append(std::move(listing.names));
-            done += count;
-            continue;
-        }
-        for (qsizetype i = 0; i < count; ++i) {
-            const QStringView name = listing.names.at(i);
-            if (expression.matches(name)) {
-                rows.names.append(name);
-                rows.rowFolders.push_back(folderIndex);
-            }
-            if (++done == nextReport) {
-                progress(done, total);
-                nextReport += stride;
-            }
-        }
+        const int folderIndex = static_cast<int>(all.folders.size());
+        all.folders.push_back(listing.folder);
+        all.rowFolders.insert(all.rowFolders.end(), static_cast<size_t>(listing.names.size()),
+                              folderIndex);
+        all.names.append(std::move(listing.names));
     }
-    progress(total, total);
-    return rows;
+    all.listed = all.names.size();
+    m_listing = std::move(all);
+    return keepMatches(*m_listing, search, progress);
+}
+
+std::optional<RomRows> RomCatalogue::narrow(const QString& search) const {
+    if (!m_listing)
+        return std::nullopt;
+    return keepMatches(*m_listing, search, {});
 }
 
 QString refreshCaption(bool bFirstLoad, int rows, qint64 listed) {

@@ -7,6 +7,7 @@
 
 #include <functional>
 #include <future>
+#include <optional>
 #include <vector>
 
 // The rows of a refresh: row i is names[i], found in folders[rowFolders[i]].
@@ -16,6 +17,8 @@ struct RomRows {
     std::vector<int> rowFolders;
     // Every name the folders listed, matched or not.
     qint64 listed = 0;
+
+    bool operator==(const RomRows&) const = default;
 };
 
 // How far a refresh is: `done` of `total` names looked at.
@@ -41,11 +44,16 @@ public:
     // empty search. The folders are read on another thread; `whileListing`, when given, is
     // called once before and then about every 16 ms until they are read. `progress` is
     // called with done 0 once every folder is listed, then at least every thousandth of the
-    // names while a search is matched (without one, each folder is taken whole at once),
-    // and last with done equal to total.
+    // names while a search is matched (without one, the names are taken whole at once), and
+    // last with done equal to total.
     RomRows refresh(const QStringList& folders, const QString& pattern, const QString& search,
                     const RefreshProgress& progress,
                     const std::function<void()>& whileListing = {});
+
+    // The rows of the last refresh's listing, before its search, that `search` matches (all
+    // of them for an empty one), in one pass over the names and without reading a folder;
+    // nothing before the first refresh.
+    std::optional<RomRows> narrow(const QString& search) const;
 
 private:
     struct Listing {
@@ -56,6 +64,8 @@ private:
     std::future<std::vector<Listing>> m_prefetch;
     QStringList m_prefetchFolders;
     QString m_prefetchPattern;
+    // Every row the last refresh listed, whatever its search.
+    std::optional<RomRows> m_listing;
 };
 
 // The main window's caption after a refresh: the first load counts the ROMs found, a

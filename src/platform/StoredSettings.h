@@ -51,6 +51,8 @@ inline constexpr ColourSetting backColor{"Settings", "BackColor", 0xFFFFFF};
 inline constexpr ColourSetting textColor{"Settings", "TextColor", 0};
 inline constexpr TextSetting backImg{"Settings", "BackImg", ""};
 inline constexpr BoolSetting backImgEnabled{"Settings", "BackImgEnabled", true};
+// Off: the list keeps its rows while the user types, until Enter.
+inline constexpr BoolSetting searchAsYouType{"Settings", "SearchAsYouType", true};
 
 inline constexpr PlaceSetting mainWindow{"winpos", {500, 500, 4905, 6570}, true};
 inline constexpr BoolSetting mainWindowMaximized{"winpos", "max", false};

@@ -100,3 +100,25 @@ TEST_F(MainWindow, FoldersPatternSearchCaptionsAndThePopupMenu) {
               "in your search: AND, OR, XOR, NOT\r\nBut the Operations must be capitalized.\r\n"
               "for example...  pac AND man... asteroids AND NOT [pal].");
 }
+
+// Typing narrows the last refresh's rows, reading no folder; Settings' item turns it off.
+TEST_F(MainWindow, SearchAsYouTypeNarrowsTheLastListing) {
+    storePaths({"Pa.bin", "Pl.bin", "K.bin"});
+    auto* search = control<QLineEdit>(load(), "txtSearch");
+    auto* pause = control<QTimer>(*window, "tmrSearch");
+    const auto type = [&](const QString& text) { // the listing as typed, then after Enter
+        search->clear();
+        QTest::keyClicks(search, text);
+        const QString typed = QTest::qWaitFor([&] { return !pause->isActive(); }) ? listing() : "";
+        QTest::keyClick(search, Qt::Key_Return);
+        return typed + " / " + listing();
+    };
+    fake.writeFile("roms/Px.bin");
+    const QString one = type("p AND NOT l"), all = type("");
+    action("mnuSearchAsYouType")->trigger();
+    EXPECT_EQ(one + '\n' + all + '\n' + type("k") + ' ' + stored("SearchAsYouType"),
+              "lum - 1 Match out of 3 | Pa.bin / lum - 2 Matches out of 4 | Pa.bin, Px.bin\n"
+              "lum - 4 Matches out of 4 | K.bin, Pa.bin, Pl.bin, Px.bin / lum - 4 Matches out "
+              "of 4 | K.bin, Pa.bin, Pl.bin, Px.bin\nlum - 4 Matches out of 4 | K.bin, Pa.bin, "
+              "Pl.bin, Px.bin / lum - 1 Match out of 4 | K.bin False");
+}
