@@ -44,7 +44,8 @@ frmMain::frmMain(Platform& platform) : m_platform(platform) {
     const SettingsStore& store = m_platform.store;
     const QStringList folders = enabledRomFolders(store);
     if (!folders.isEmpty() && !read(store, stored::z26Path).isEmpty())
-        m_catalogue.prefetch(folders, read(store, stored::romFilter));
+        m_catalogue.prefetch(folders, read(store, stored::romFilter),
+                             read(store, stored::romSubfolders));
     setObjectName(QStringLiteral("frmMain"));
     setWindowTitle(QStringLiteral("lum"));
     createControls();
@@ -397,7 +398,7 @@ void frmMain::RefreshMainList() {
     // Painted while the folders are read, but no key or click starts anything meanwhile.
     const auto paint = [] { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); };
     RomRows rows = m_catalogue.refresh(enabledRomFolders(store), read(store, stored::romFilter),
-                                       search, progress, paint);
+                                       read(store, stored::romSubfolders), search, progress, paint);
     const qint64 listed = rows.listed;
     m_listModel->setRows(std::move(rows.folders), std::move(rows.names),
                          std::move(rows.rowFolders));

@@ -14,9 +14,13 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <set>
+#include <utility>
 
 #include <dirent.h>
+#include <fcntl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -306,14 +310,14 @@ bool FilePattern::matchesFoldedAscii(std::string_view foldedName) const {
         });
 }
 
-NameList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
-    if (folder.isEmpty())
-        return {};
-    const QByteArray native = QFile::encodeName(folder);
-    std::unique_ptr<DIR, int (*)(DIR*)> dir(opendir(native.constData()), closedir);
-    if (!dir)
-        return {};
-    const int dirFd = dirfd(dir.get());
+namespace {
+
+// Lists the open folder `dir` with `pattern`. When `subfolders` is given, the names of the
+// folders in it are added there; links to folders are neither listed nor added, so that a
+// link back up the tree cannot make a walk endless.
+NameList listOpenFolder(DIR* dir, const FilePattern& pattern,
+                        std::vector<std::string>* subfolders) {
+    const int dirFd = dirfd(dir);
 
     // Reading a large folder is mostly the kernel's work, so once a whole batch of names
     // has come in, another thread matches and decodes them while the rest is read. A small
@@ -342,27 +346,135 @@ NameList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
     };
 
     NameBatch batch;
-    while (const dirent* entry = readdir(dir.get())) {
+    while (const dirent* entry = readdir(dir)) {
         if (entry->d_name[0] == '.')
             continue;
-        bool regular = entry->d_type == DT_REG;
-        if (entry->d_type == DT_UNKNOWN || entry->d_type == DT_LNK) {
-            struct stat st {};
-            regular = fstatat(dirFd, entry->d_name, &st, 0) == 0 && S_ISREG(st.st_mode);
+        unsigned char type = entry->d_type;
+        struct stat st {};
+        if (type == DT_UNKNOWN) {
+            if (fstatat(dirFd, entry->d_name, &st, AT_SYMLINK_NOFOLLOW) != 0)
+                continue;
+            type = S_ISDIR(st.st_mode)   ? DT_DIR
+                   : S_ISREG(st.st_mode) ? DT_REG
+                   : S_ISLNK(st.st_mode) ? DT_LNK
+                                         : DT_UNKNOWN;
         }
+        if (type == DT_DIR && subfolders != nullptr)
+            subfolders->emplace_back(entry->d_name);
+        // A link is listed when it leads to a file.
+        const bool regular =
+            type == DT_REG ||
+            (type == DT_LNK && fstatat(dirFd, entry->d_name, &st, 0) == 0 && S_ISREG(st.st_mode));
         if (!regular)
             continue;
         batch.names.append(entry->d_name).push_back('\0');
         if (++batch.count == kBatchNames)
             deliver(batch);
     }
-    dir.reset();
     deliver(batch);
     if (matching.valid()) {
         queue.close();
         matching.get();
     }
     return matched.takeSorted();
+}
+
+// Opens the folder at `native`; a link is not followed unless `followLink`.
+std::unique_ptr<DIR, int (*)(DIR*)> openFolder(const QByteArray& native, bool followLink) {
+    std::unique_ptr<DIR, int (*)(DIR*)> dir(nullptr, closedir);
+    const int fd = open(native.constData(),
+                        O_RDONLY | O_DIRECTORY | O_CLOEXEC | (followLink ? 0 : O_NOFOLLOW));
+    if (fd < 0)
+        return dir;
+    dir.reset(fdopendir(fd));
+    if (!dir)
+        close(fd);
+    return dir;
+}
+
+// A folder met before, through another root or a mount of it, is not listed again.
+class SeenFolders {
+public:
+    bool firstVisit(DIR* dir) {
+        struct stat st {};
+        if (fstat(dirfd(dir), &st) != 0)
+            return true;
+        return m_seen
+            .emplace(static_cast<std::uint64_t>(st.st_dev), static_cast<std::uint64_t>(st.st_ino))
+            .second;
+    }
+
+private:
+    std::set<std::pair<std::uint64_t, std::uint64_t>> m_seen;
+};
+
+// Appends `root`'s tree to `listings`: the root, then each sub-folder's tree in the order of
+// its name without regard to case, as files are.
+void listTree(const QString& root, const FilePattern& pattern, SeenFolders& seen,
+              std::vector<FolderListing>& listings) {
+    struct Pending {
+        QString folder;
+        QByteArray native;
+    };
+    // The user's own folder may be a link; the folders found below it are not followed.
+    std::vector<Pending> pending{{root, QFile::encodeName(root)}};
+    bool bRoot = true;
+    while (!pending.empty()) {
+        Pending next = std::move(pending.back());
+        pending.pop_back();
+        const auto dir = openFolder(next.native, std::exchange(bRoot, false));
+        if (!dir || !seen.firstVisit(dir.get()))
+            continue;
+        std::vector<std::string> subfolders;
+        listings.push_back({next.folder, listOpenFolder(dir.get(), pattern, &subfolders)});
+
+        struct Named {
+            QString key, name;
+            std::string bytes;
+        };
+        std::vector<Named> named;
+        named.reserve(subfolders.size());
+        for (std::string& bytes : subfolders) {
+            QString name = decodeName(bytes);
+            named.push_back({foldCase(name), std::move(name), std::move(bytes)});
+        }
+        std::sort(named.begin(), named.end(), [](const Named& a, const Named& b) {
+            return a.key != b.key ? a.key < b.key : a.bytes < b.bytes;
+        });
+        const bool bSlash = next.folder.endsWith(u'/');
+        // Last pushed is listed first.
+        for (auto it = named.rbegin(); it != named.rend(); ++it)
+            pending.push_back(
+                {next.folder + (bSlash ? QString() : QStringLiteral("/")) + it->name,
+                 next.native + (bSlash ? "" : "/") + QByteArray::fromStdString(it->bytes)});
+    }
+}
+
+} // namespace
+
+NameList listMatchingFiles(const QString& folder, const FilePattern& pattern) {
+    if (folder.isEmpty())
+        return {};
+    const QByteArray native = QFile::encodeName(folder);
+    std::unique_ptr<DIR, int (*)(DIR*)> dir(opendir(native.constData()), closedir);
+    if (!dir)
+        return {};
+    return listOpenFolder(dir.get(), pattern, nullptr);
+}
+
+std::vector<FolderListing> listFolders(const QStringList& folders, const FilePattern& pattern,
+                                       bool bSubfolders) {
+    std::vector<FolderListing> listings;
+    if (!bSubfolders) {
+        for (const QString& folder : folders)
+            listings.push_back({folder, listMatchingFiles(folder, pattern)});
+        return listings;
+    }
+    SeenFolders seen;
+    for (const QString& folder : folders)
+        if (!folder.isEmpty())
+            listTree(folder, pattern, seen, listings);
+    return listings;
 }
 
 void FileLister::setPattern(const QString& pattern) {

@@ -60,3 +60,15 @@ private:
 
 // Lists `folder` with `pattern` (the lister's work, without a lister).
 NameList listMatchingFiles(const QString& folder, const FilePattern& pattern);
+
+// One folder's matching files.
+struct FolderListing {
+    QString folder;
+    NameList names;
+};
+
+// Lists each folder in turn. With `bSubfolders`, each is followed by the folders below it
+// (depth first, in name order without regard to case), every one its own listing; links to
+// folders are not followed, and a folder met twice is listed once.
+std::vector<FolderListing> listFolders(const QStringList& folders, const FilePattern& pattern,
+                                       bool bSubfolders);

@@ -46,16 +46,13 @@ RomCatalogue::~RomCatalogue() {
     dropPrefetch();
 }
 
-void RomCatalogue::prefetch(const QStringList& folders, const QString& pattern) {
+void RomCatalogue::prefetch(const QStringList& folders, const QString& pattern, bool bSubfolders) {
     dropPrefetch();
     m_prefetchFolders = folders;
     m_prefetchPattern = pattern;
-    m_prefetch = std::async(std::launch::async, [folders, pattern] {
-        const FilePattern filePattern(pattern);
-        std::vector<Listing> listings;
-        for (const QString& folder : folders)
-            listings.push_back({folder, listMatchingFiles(folder, filePattern)});
-        return listings;
+    m_bPrefetchSubfolders = bSubfolders;
+    m_prefetch = std::async(std::launch::async, [folders, pattern, bSubfolders] {
+        return listFolders(folders, FilePattern(pattern), bSubfolders);
     });
 }
 
@@ -64,12 +61,13 @@ void RomCatalogue::dropPrefetch() {
         m_prefetch.get();
 }
 
-RomRows RomCatalogue::refresh(const QStringList& folders, const QString& pattern,
+RomRows RomCatalogue::refresh(const QStringList& folders, const QString& pattern, bool bSubfolders,
                               const QString& search, const RefreshProgress& progress,
                               const std::function<void()>& whileListing) {
     // Folders or a pattern changed since a listing started ahead: they are listed again.
-    if (!m_prefetch.valid() || folders != m_prefetchFolders || pattern != m_prefetchPattern)
-        prefetch(folders, pattern);
+    if (!m_prefetch.valid() || folders != m_prefetchFolders || pattern != m_prefetchPattern ||
+        bSubfolders != m_bPrefetchSubfolders)
+        prefetch(folders, pattern, bSubfolders);
     // A slow folder (a network share) is read on the other thread while the caller keeps
     // its window painted.
     if (whileListing) {
@@ -77,9 +75,9 @@ RomRows RomCatalogue::refresh(const QStringList& folders, const QString& pattern
         while (m_prefetch.wait_for(std::chrono::milliseconds(16)) != std::future_status::ready)
             whileListing();
     }
-    std::vector<Listing> listings = m_prefetch.get();
+    std::vector<FolderListing> listings = m_prefetch.get();
     RomRows all;
-    for (Listing& listing : listings) {
+    for (FolderListing& listing : listings) {
         const int folderIndex = static_cast<int>(all.folders.size());
         all.folders.push_back(listing.folder);
         all.rowFolders.insert(all.rowFolders.end(), static_cast<size_t>(listing.names.size()),

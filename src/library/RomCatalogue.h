@@ -1,5 +1,6 @@
 #pragma once
 
+#include "library/FileLister.h"
 #include "library/NameList.h"
 
 #include <QString>
@@ -35,19 +36,20 @@ public:
 
     // Starts listing the folders on another thread, so that a large collection is listed
     // while the window is built; the next refresh takes the listing over when it is for
-    // the same folders and pattern.
-    void prefetch(const QStringList& folders, const QString& pattern);
+    // the same folders, pattern and sub-folder choice.
+    void prefetch(const QStringList& folders, const QString& pattern, bool bSubfolders);
     // Forgets a listing no refresh will take.
     void dropPrefetch();
 
-    // Lists each folder once and keeps the names the search matches, all of them for an
+    // Lists each folder once (with `bSubfolders`, each folder below it too, as a folder of
+    // its own) and keeps the names the search matches, all of them for an
     // empty search. The folders are read on another thread; `whileListing`, when given, is
     // called once before and then about every 16 ms until they are read. `progress` is
     // called with done 0 once every folder is listed, then at least every thousandth of the
     // names while a search is matched (without one, the names are taken whole at once), and
     // last with done equal to total.
-    RomRows refresh(const QStringList& folders, const QString& pattern, const QString& search,
-                    const RefreshProgress& progress,
+    RomRows refresh(const QStringList& folders, const QString& pattern, bool bSubfolders,
+                    const QString& search, const RefreshProgress& progress,
                     const std::function<void()>& whileListing = {});
 
     // The rows of the last refresh's listing, before its search, that `search` matches (all
@@ -56,14 +58,10 @@ public:
     std::optional<RomRows> narrow(const QString& search) const;
 
 private:
-    struct Listing {
-        QString folder;
-        NameList names;
-    };
-
-    std::future<std::vector<Listing>> m_prefetch;
+    std::future<std::vector<FolderListing>> m_prefetch;
     QStringList m_prefetchFolders;
     QString m_prefetchPattern;
+    bool m_bPrefetchSubfolders = false;
     // Every row the last refresh listed, whatever its search.
     std::optional<RomRows> m_listing;
 };

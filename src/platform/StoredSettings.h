@@ -47,6 +47,8 @@ namespace stored {
 
 inline constexpr TextSetting z26Path{"Settings", "Z26Path", ""};
 inline constexpr TextSetting romFilter{"Settings", "ROMFilter", "*.bin"};
+// On: the folders below each ROM folder are listed too.
+inline constexpr BoolSetting romSubfolders{"Settings", "ROMSubfolders", false};
 inline constexpr ColourSetting backColor{"Settings", "BackColor", 0xFFFFFF};
 inline constexpr ColourSetting textColor{"Settings", "TextColor", 0};
 inline constexpr TextSetting backImg{"Settings", "BackImg", ""};

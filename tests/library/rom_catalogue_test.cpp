@@ -4,8 +4,11 @@
 #include "library/RomListModel.h"
 
 #include <QAbstractItemModelTester>
+#include <QFile>
 
 #include <gtest/gtest.h>
+
+#include <tuple>
 
 // Folders in order, each name with its own; a folder gone or a file in its place lists nothing.
 TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
@@ -27,9 +30,9 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
     const auto refreshed = [&](const QStringList& folders, const QString& pattern,
                                const QString& search) -> QString {
         std::vector<std::pair<qint64, qint64>> calls;
-        RomRows rows = catalogue.refresh(folders, pattern, search, [&](qint64 done, qint64 all) {
-            calls.emplace_back(done, all);
-        });
+        RomRows rows =
+            catalogue.refresh(folders, pattern, false, search,
+                              [&](qint64 done, qint64 all) { calls.emplace_back(done, all); });
         EXPECT_EQ(catalogue.narrow(search), rows); // the same, as typed
         if (calls.empty())
             return "no progress";
@@ -58,7 +61,7 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
          "many/Game 1234.rom | 0/2500..2500/2500 | lum - 1 Match out of 2500"},
     };
     for (const auto& [pattern, search, expected] : cases) {
-        catalogue.prefetch({a}, "*.bin"); // for other folders: not taken
+        catalogue.prefetch({a}, "*.bin", false); // for other folders: not taken
         EXPECT_EQ(refreshed(folders, pattern, search), expected);
     }
     EXPECT_EQ(model.index(0, 0).data().toString() + " in " + model.index(0, 1).data().toString() +
@@ -67,9 +70,46 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
     EXPECT_EQ(model.rowPath(-1) + model.rowPath(1), "");
 
     // A listing started ahead serves one refresh of the same folders and pattern at most.
-    catalogue.prefetch({a}, "*.bin");
+    catalogue.prefetch({a}, "*.bin", false);
     refreshed({a}, "*.bin", "");
     fake.writeFile("a/Late.bin");
     EXPECT_TRUE(
         refreshed({a}, "*.bin", "").startsWith("a/Combat.bin, a/Late.bin, a/Pitfall.bin |"));
+}
+
+// Each folder of a tree is its own, in name order after the files above it; a link to a file
+// is listed, a link back up the tree is not followed, and a folder met twice is listed once.
+TEST(RomCatalogue, ListsSubfoldersOnlyWhenAskedEachOnceWithItsOwnFolder) {
+    FakePlatform fake;
+    for (const char* file : {"tree/Top.bin", "tree/sub/B.bin", "tree/sub/deep/C.bin",
+                             "tree/Alpha/A.bin", "tree/Alpha/x.txt"})
+        fake.writeFile(file);
+    const QString root = fake.root(), tree = root + "/tree";
+    ASSERT_TRUE(QFile::link(tree, tree + "/loop"));
+    ASSERT_TRUE(QFile::link(tree + "/sub/B.bin", tree + "/link.bin"));
+    RomCatalogue catalogue;
+    const auto listed = [&](const QStringList& folders, bool bSubfolders) {
+        catalogue.prefetch(folders, "*.bin", !bSubfolders); // for the other choice: not taken
+        const RomRows rows = catalogue.refresh(folders, "*.bin", bSubfolders, "", {});
+        QStringList shown;
+        for (qsizetype i = 0; i < rows.names.size(); ++i)
+            shown << QDir(root).relativeFilePath(rows.folders[rows.rowFolders[size_t(i)]]) + ": " +
+                         rows.names.at(i).toString();
+        return shown.join(", ");
+    };
+    const std::tuple<QStringList, bool, QString> cases[] = {
+        {{tree}, false, "tree: link.bin, tree: Top.bin"},
+        {{tree},
+         true,
+         "tree: link.bin, tree: Top.bin, tree/Alpha: A.bin, tree/sub: B.bin, tree/sub/deep: C.bin"},
+        {{tree + "/sub", tree},
+         true,
+         "tree/sub: B.bin, tree/sub/deep: C.bin, tree: link.bin, tree: Top.bin, tree/Alpha: A.bin"},
+        {{tree + "/loop"},
+         true, // a folder chosen by its link is followed, once
+         "tree/loop: link.bin, tree/loop: Top.bin, tree/loop/Alpha: A.bin, tree/loop/sub: B.bin, "
+         "tree/loop/sub/deep: C.bin"},
+    };
+    for (const auto& [folders, bSubfolders, expected] : cases)
+        EXPECT_EQ(listed(folders, bSubfolders), expected) << qPrintable(folders.join(' '));
 }
