@@ -363,10 +363,19 @@ void frmSettings::recountRomRows() {
     }
     m_bCountsPending = false;
     const QSignalBlocker quiet(m_ui->vbalListDefPaths);
+    const bool bSubfolders = m_ui->chkROMSubfolders->isChecked();
+    const FilePattern pattern(FileROM.pattern());
     for (int i = 0; i < m_ui->vbalListDefPaths->topLevelItemCount(); ++i) {
         QTreeWidgetItem* row = m_ui->vbalListDefPaths->topLevelItem(i);
-        FileROM.setPath(row->text(0));
-        row->setText(1, QString::number(FileROM.ListCount()));
+        if (!bSubfolders) {
+            FileROM.setPath(row->text(0));
+            row->setText(1, QString::number(FileROM.ListCount()));
+            continue;
+        }
+        qsizetype count = 0;
+        for (const FolderListing& listing : listFolders({row->text(0)}, pattern, true))
+            count += listing.names.size();
+        row->setText(1, QString::number(count));
     }
     FileROM.takeNames(); // only the counts are kept, not a folder's names
 }
@@ -386,6 +395,7 @@ void frmSettings::LoadDefaultPaths() {
     // next save disable every folder.
     for (const RomFolder& folder : readRomFolders(m_platform.store))
         addRomRow(folder.path, folder.enabled);
+    m_ui->chkROMSubfolders->setChecked(read(m_platform.store, stored::romSubfolders));
     // Counts every row with the page's pattern.
     txtDefPathFilter_Change();
 
@@ -410,6 +420,11 @@ void frmSettings::txtDefPathFilter_Change() {
     FileROM.setPattern(pattern);
     recountRomRows();
     write(m_platform.store, stored::romFilter, pattern);
+}
+
+void frmSettings::chkROMSubfolders_Click() {
+    write(m_platform.store, stored::romSubfolders, m_ui->chkROMSubfolders->isChecked());
+    recountRomRows();
 }
 
 void frmSettings::vbalListDefPaths_ItemChanged(QTreeWidgetItem*, int column) {

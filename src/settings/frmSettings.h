@@ -151,6 +151,7 @@ private:
     void LoadDefaultPaths();
     void SaveDefaultPaths();
     void txtDefPathFilter_Change();
+    void chkROMSubfolders_Click();
     void cmdAddZ26Path_Click();
     void mnuROMSRemove_Click();
     void mnuROMSRefresh_Click();
@@ -162,7 +163,8 @@ private:
     void txtDefPathz26_OLEDragDrop(const QMimeData* data);
     QTreeWidgetItem* selectedRomRow() const;
     void addRomRow(const QString& path, bool bEnabled);
-    // Sets every row's count from its folder with the current pattern.
+    // Sets every row's count from its folder (and, when asked, the folders below it) with
+    // the current pattern.
     void recountRomRows();
 
     Platform& m_platform;

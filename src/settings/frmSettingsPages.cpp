@@ -396,7 +396,12 @@ void frmSettings::createDefaultPathsPage() {
     paths->setContextMenuPolicy(Qt::CustomContextMenu);
     paths->setAcceptDrops(true);
     paths->viewport()->setAcceptDrops(true);
-    tight(new QVBoxLayout(fraDefPathRom))->addWidget(paths);
+    m_ui->chkROMSubfolders = check("chkROMSubfolders", "Include sub-folders");
+    connect(m_ui->chkROMSubfolders, &QCheckBox::clicked, this,
+            &frmSettings::chkROMSubfolders_Click);
+    auto* rom = tight(new QVBoxLayout(fraDefPathRom));
+    rom->addWidget(paths);
+    rom->addWidget(m_ui->chkROMSubfolders);
     page->addWidget(fraDefPathRom, 1);
 
     QMenu* popup = m_ui->mnuROMSPopup =

@@ -62,6 +62,7 @@ struct frmSettings::Ui {
     QLineEdit* txtDefPathFilter = nullptr;
     QLineEdit* txtDefPathz26 = nullptr;
     QTreeWidget* vbalListDefPaths = nullptr;
+    QCheckBox* chkROMSubfolders = nullptr;
     QMenu* mnuROMSPopup = nullptr;
     QAction* mnuROMSRemove = nullptr;
 

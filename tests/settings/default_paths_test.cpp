@@ -88,6 +88,10 @@ TEST_F(DefaultPaths, ThePageCountsFoldersKeepsMissingOnesReloadsAndTakesOnlyAnEm
     EXPECT_EQ(stored("ROMFilter"), "*.bin");
     QTest::keyClick(list(*w), Qt::Key_F5); // saves the list and reads it back
     EXPECT_EQ(readRomFolders(*fake.reopenStore()), all);
+    romFolder("a/sub", {"2.bin"}); // counted with its folder once asked for, and stored
+    control<QCheckBox>(*w, "chkROMSubfolders")->click();
+    EXPECT_EQ(QStringList({rows(*w)[0], stored("ROMSubfolders")}),
+              QStringList({a + " 2 off", "True"}));
 
     // Choosing the page reads the store again, also by a click on the tab already shown.
     QDir(a).removeRecursively();
