@@ -11,6 +11,7 @@
 #include "platform/QtDialogs.h"
 #include "platform/QtShell.h"
 #include "platform/Registry.h"
+#include "platform/StoredSettings.h"
 
 #include <QAction>
 #include <QApplication>
@@ -73,7 +74,9 @@ size_t baseline(const std::vector<std::string>& folders) {
 
 struct Setup {
     std::string name;
-    std::vector<std::string> folders;
+    std::vector<std::string> folders; // the ROM folders stored
+    std::vector<std::string> read;    // the folders the baseline reads
+    bool bSubfolders = false;
 };
 
 } // namespace
@@ -83,20 +86,29 @@ int main(int argc, char** argv) {
     QApplication app(argc, argv);
     const std::string root = "/tmp/lum-bench-roms";
 
-    Setup one{"refresh 100,000 files, 1 folder", {root + "/one"}};
+    Setup one{"refresh 100,000 files, 1 folder", {root + "/one"}, {root + "/one"}};
     makeFolder(one.folders[0], 100000, 10000);
-    Setup ten{"refresh 10 folders of 10,000", {}};
+    Setup ten{"refresh 10 folders of 10,000", {}, {}};
     for (int i = 0; i < 10; ++i) {
         ten.folders.push_back(root + "/ten/" + std::to_string(i));
         makeFolder(ten.folders.back(), 10000, 0);
     }
+    ten.read = ten.folders;
+    // One folder stored, its ten sub-folders found by the walk.
+    Setup tree{"refresh 10 folders of 10,000 in a tree", {root + "/tree"}, {root + "/tree"}, true};
+    for (int i = 0; i < 10; ++i) {
+        tree.read.push_back(root + "/tree/" + std::to_string(i));
+        makeFolder(tree.read.back(), 10000, 0);
+    }
 
-    for (const Setup& setup : {one, ten}) {
-        const QString config = QString::fromStdString(root) + "/config-" +
-                               QString::number(setup.folders.size()) + ".ini";
+    int run = 0;
+    for (const Setup& setup : {one, ten, tree}) {
+        const QString config =
+            QString::fromStdString(root) + "/config-" + QString::number(++run) + ".ini";
         QFile::remove(config);
         IniSettingsStore store(config);
         store.SaveSetting("Settings", "ROMFilter", "*.bin");
+        write(store, stored::romSubfolders, setup.bSubfolders);
         for (size_t n = 1; n <= setup.folders.size(); ++n) {
             const QString suffix = n == 1 ? QString() : QString::number(n);
             store.SaveSetting("Settings", "ROM" + suffix + "Path",
@@ -123,14 +135,14 @@ int main(int argc, char** argv) {
         auto* searchBox = window.findChild<QLineEdit*>("txtSearch");
         QCoreApplication::processEvents();
 
-        const bench::Samples base = bench::measure(7, [&] { baseline(setup.folders); });
+        const bench::Samples base = bench::measure(7, [&] { baseline(setup.read); });
         const bench::Samples ours = bench::measure(7, [&] {
             window.RefreshMainList();
             QCoreApplication::processEvents(); // the list's first paint
         });
         bench::report(setup.name, ours, "readdir", base, 1.5);
 
-        if (setup.folders.size() == 1) {
+        if (run == 1) {
             // The progress bar's share: the same refresh with the bar drawing nothing, the
             // two measured in turns. The share is the median of each pair's difference, so
             // that the machine's drift, which is large next to the bar's cost, cancels out.
