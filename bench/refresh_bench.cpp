@@ -127,6 +127,7 @@ int main(int argc, char** argv) {
                           registry,
                           QDir::tempPath(),
                           QDir::tempPath(),
+                          QDir::tempPath(),
                           QDir::tempPath()};
         frmMain window(platform);
         window.resize(400, 600);

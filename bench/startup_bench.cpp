@@ -100,7 +100,7 @@ int runLum(int argc, char** argv, const char* configFile) {
     QtDownloader network;
     ToolRegistry registry;
     const QString here = QApplication::applicationDirPath();
-    Platform platform{store, dialogs, shell, here, network, registry, here, here, here};
+    Platform platform{store, dialogs, shell, here, network, registry, here, here, here, here};
     frmMain window(platform);
     phase("windows");
     FirstPaint watcher(&phase);

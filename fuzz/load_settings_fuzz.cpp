@@ -102,7 +102,7 @@ struct Harness {
     NoNetwork network;
     NoRegistry registry;
     Platform platform{store,    dialogs,    shell,      dir.path(), network,
-                      registry, dir.path(), dir.path(), dir.path()};
+                      registry, dir.path(), dir.path(), dir.path(), dir.path()};
     frmSettings window{platform};
     QString startState = dir.filePath(QStringLiteral("start.lum"));
     QString input = dir.filePath(QStringLiteral("input.lum"));

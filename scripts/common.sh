@@ -1,6 +1,6 @@
 # Shared by scripts/run and scripts/test.
 ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
-BUILD_PACKAGES=(cmake ninja-build g++ qt6-base-dev qt6-qpa-plugins libgl-dev libgtest-dev libgmock-dev)
+BUILD_PACKAGES=(cmake ninja-build g++ qt6-base-dev qt6-qpa-plugins libgl-dev libgtest-dev libgmock-dev libarchive-dev)
 # What only the tests use: desktop-file-validate checks the installed desktop entry.
 TEST_PACKAGES=(desktop-file-utils)
 

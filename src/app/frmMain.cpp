@@ -33,6 +33,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
+#include <QTemporaryDir>
 #include <QTimer>
 
 #include <climits>
@@ -579,8 +580,11 @@ void frmMain::mnuMainGameInfo_Click() {
 }
 
 qint16 frmMain::LookupSoftwareID(const QString& path) {
+    QString rom = path;
+    if (isRomArchiveName(path) && (rom = unpackArchive(path).path).isEmpty())
+        return 0;
     return ::LookupSoftwareID(*mcrc32, m_platform.programFolder + QStringLiteral("/CRCID.dat"),
-                              path);
+                              rom);
 }
 
 QString frmMain::selectedRowPath() const {

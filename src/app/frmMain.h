@@ -1,6 +1,7 @@
 #pragma once
 
 #include "emulator/EmulatorOptions.h"
+#include "library/RomArchive.h"
 #include "library/RomCatalogue.h"
 #include "ui/ScreenPlace.h"
 
@@ -23,6 +24,7 @@ class QGroupBox;
 class QLabel;
 class QLineEdit;
 class QMenu;
+class QTemporaryDir;
 class QTimer;
 class CCRC32;
 class RomListModel;
@@ -160,8 +162,11 @@ private:
     QWidget* boxOwner();
     // Says that z26 at `emulator` could not be started, and why.
     void launchFailed(const QString& emulator, const QString& reason);
-    // The software ID of a ROM file in the game database beside the program, or 0.
+    // The software ID of a ROM file (an archive's first file) in the game database beside
+    // the program, or 0.
     qint16 LookupSoftwareID(const QString& path);
+    // An archive's first file extracted into this run's private folder, or why not.
+    ArchiveResult unpackArchive(const QString& archive);
     // The selected row's full path, or the empty text when no row is selected.
     QString selectedRowPath() const;
 
@@ -179,4 +184,6 @@ private:
     ScreenFit m_place;          // as opened: a corrected place is not saved unless changed
     QPointer<frmAbout> m_about; // one at a time
     RomListModel* m_listModel = nullptr;
+    // Where archives are extracted; removed with the window, so the files live while lum runs.
+    std::unique_ptr<QTemporaryDir> m_unpacked;
 };

@@ -19,6 +19,7 @@
 #include <QCoreApplication>
 #include <QDir>
 #include <QFileInfo>
+#include <QTemporaryDir>
 
 void frmMain::LoadROM(bool ForceLoad) {
     launchRom(m_commandLineRom.isEmpty() ? selectedRowPath() : m_commandLineRom, ForceLoad);
@@ -43,7 +44,7 @@ frmMain::Launch frmMain::launchRom(const QString& romFile, bool ForceLoad) {
         launchFailed(completeZ26Path(z26Path), QStringLiteral("There is no program file there."));
         return Launch::NotStarted;
     }
-    const QString romPath = GetShortPath(romFile);
+    QString romPath = GetShortPath(romFile);
     if (!FileExist(romPath)) {
         m_platform.dialogs.MsgBox(
             boxOwner(),
@@ -52,6 +53,19 @@ frmMain::Launch frmMain::launchRom(const QString& romFile, bool ForceLoad) {
             MsgButtons::Ok, MsgIcon::Exclamation, QStringLiteral("Invalid ROM Path"));
         QCoreApplication::processEvents();
         return Launch::NotStarted;
+    }
+    if (isRomArchiveName(romPath)) {
+        const ArchiveResult unpacked = unpackArchive(romPath);
+        if (unpacked.path.isEmpty()) {
+            m_platform.dialogs.MsgBox(
+                boxOwner(),
+                QStringLiteral("No ROM could be taken from the archive:\n\n") +
+                    readableName(QDir::toNativeSeparators(romFile)) + QStringLiteral("\n\n") +
+                    unpacked.error,
+                MsgButtons::Ok, MsgIcon::Exclamation, QStringLiteral("Archive Not Usable"));
+            return Launch::NotStarted;
+        }
+        romPath = unpacked.path;
     }
 
     frmSettings& settings = settingsWindow();
@@ -127,6 +141,24 @@ std::optional<int> frmMain::startFromCommandLine(const CommandLine& command) {
     // The run ends with z26 started from the edited switches, or with the window closed.
     settingsWindow().installEventFilter(this);
     return std::nullopt;
+}
+
+ArchiveResult frmMain::unpackArchive(const QString& archive) {
+    if (!m_unpacked) {
+        // Private: other users of the machine need not see what is played.
+        QDir().mkpath(m_platform.runtimeFolder);
+        QFile::setPermissions(m_platform.runtimeFolder,
+                              QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+        m_unpacked =
+            std::make_unique<QTemporaryDir>(m_platform.runtimeFolder + QStringLiteral("/XXXXXX"));
+    }
+    if (!m_unpacked->isValid())
+        return {QString(), QStringLiteral("There is no folder to extract it into: ") +
+                               m_unpacked->errorString() + u'.'};
+    // A command-line run ends as z26 starts: the file must outlive it (the session clears
+    // the runtime folder).
+    m_unpacked->setAutoRemove(m_commandLineRom.isEmpty());
+    return extractFirstRom(archive, m_unpacked->path());
 }
 
 QString frmMain::emulatorWorkingFolder(const QString& emulator) const {

@@ -38,9 +38,10 @@ int main(int argc, char** argv) {
     QtDownloader network;
     ToolRegistry registry;
     const UserFolders folders = desktopUserFolders();
-    Platform platform{store,       dialogs,  shell,        QApplication::applicationDirPath(),
-                      network,     registry, folders.user, folders.cache,
-                      folders.data};
+    Platform platform{
+        store,        dialogs,        shell,        QApplication::applicationDirPath(),
+        network,      registry,       folders.user, folders.cache,
+        folders.data, folders.runtime};
 
     frmMain window(platform);
     if (command.mode != CommandLine::Mode::Window) {

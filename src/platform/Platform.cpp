@@ -9,7 +9,9 @@ UserFolders desktopUserFolders() {
     const auto under = [](QStandardPaths::StandardLocation where) {
         return QStandardPaths::writableLocation(where) + QStringLiteral("/lum");
     };
-    return {QFileInfo(IniSettingsStore::defaultFilePath()).absolutePath(),
-            under(QStandardPaths::GenericCacheLocation),
-            under(QStandardPaths::GenericDataLocation)};
+    const QString cache = under(QStandardPaths::GenericCacheLocation);
+    const QString runtime = qEnvironmentVariable("XDG_RUNTIME_DIR");
+    return {QFileInfo(IniSettingsStore::defaultFilePath()).absolutePath(), cache,
+            under(QStandardPaths::GenericDataLocation),
+            runtime.isEmpty() ? cache : runtime + QStringLiteral("/lum")};
 }

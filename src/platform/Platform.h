@@ -24,13 +24,17 @@ struct Platform {
     QString userFolder;
     QString cacheFolder;
     QString dataFolder;
+    // The user's private folder for files that live only while lum runs (ROMs taken out of
+    // archives).
+    QString runtimeFolder;
 };
 
-// The user's folders as the desktop names them: $XDG_CONFIG_HOME/lum, $XDG_CACHE_HOME/lum
-// and $XDG_DATA_HOME/lum.
+// The user's folders as the desktop names them: $XDG_CONFIG_HOME/lum, $XDG_CACHE_HOME/lum,
+// $XDG_DATA_HOME/lum and $XDG_RUNTIME_DIR/lum (the cache folder when the session has none).
 struct UserFolders {
     QString user;
     QString cache;
     QString data;
+    QString runtime;
 };
 UserFolders desktopUserFolders();

@@ -2,7 +2,10 @@
 
 #include "app/CommandLine.h"
 #include "emulator/OptionFile.h"
+#include "library/GameDatabase.h"
 #include "platform/QtShell.h"
+#include "platform/WebAddresses.h"
+#include "support/Archives.h"
 
 #include <QMimeData>
 
@@ -179,4 +182,27 @@ TEST_F(MainWindow, StartsCommandLineDroppedAndRecentRoms) {
     EXPECT_EQ(recent(), "b.bin ~/roms | a.bin off ~/roms |   | &Clear List ");
     action("mnuFileRecentClear")->trigger();
     EXPECT_EQ(recent() + stored("ROM1", "Recent"), "  | &Clear List off <missing>");
+}
+
+// A listed archive starts z26 on its first file, extracted into a private folder that goes with
+// the window; Game Info knows that file (57: its CRC-32). An archive that gives no ROM says why.
+TEST_F(MainWindow, StartsAndIdentifiesTheFirstFileOfAnArchive) {
+    set("ROMFilter", "*.bin;*.zip");
+    storePaths({"a.bin", "bad.zip", "good.zip"});
+    writeArchive(fake.root() + "/roms/good.zip", "zip", {{"../Known.bin", "123456789"}});
+    fake.writeFile("program/CRCID.dat", encodeGameDatabase({{57, {}, qint32(0xCBF43926u)}}));
+    load();
+    list()->setCurrentIndex(window->listModel().index(2, 0));
+    window->LoadROM();
+    action("mnuMainGameInfo")->trigger();
+    const QString folder = folderEntries(fake.platform.runtimeFolder).join(' ');
+    EXPECT_EQ(happened(), "~/emu/z26 ~/run/lum/" + folder + "/Known.bin -p8 -M1 in ~/emu\nopen " +
+                              web::kGameInfoSite + "/software_page.html?SoftwareID=57");
+    EXPECT_EQ((QFile::permissions(fake.platform.runtimeFolder) & 0x77).toInt(), 0); // group, other
+    window->launchRom(fake.root() + "/roms/bad.zip", false);                        // an empty file
+    EXPECT_EQ(happened(), "Archive Not Usable | No ROM could be taken from the archive:\n\n"
+                          "~/roms/bad.zip\n\nIt is damaged or is not a zip, 7z or gzip file "
+                          "(Unrecognized archive format). | Ok | Exclamation");
+    window.reset();
+    EXPECT_EQ(folderEntries(fake.platform.runtimeFolder).join(' '), "");
 }

@@ -20,7 +20,8 @@ FakePlatform::FakePlatform()
                                  registry,
                                  root() + "/config/lum",
                                  root() + "/cache/lum",
-                                 root() + "/data/lum"} {
+                                 root() + "/data/lum",
+                                 root() + "/run/lum"} {
     QDir().mkpath(programFolder());
 }
 

@@ -138,7 +138,7 @@ public:
     Platform with(Shell& otherShell, Downloader& otherNetwork) {
         const Platform& p = platform;
         return {p.store,    p.dialogs,    otherShell,    p.programFolder, otherNetwork,
-                p.registry, p.userFolder, p.cacheFolder, p.dataFolder};
+                p.registry, p.userFolder, p.cacheFolder, p.dataFolder,    p.runtimeFolder};
     }
     // A fresh store read back from the INI file, as the next start would see it.
     std::unique_ptr<IniSettingsStore> reopenStore() const;
