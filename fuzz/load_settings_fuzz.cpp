@@ -84,7 +84,10 @@ public:
 
 class NoNetwork final : public Downloader {
 public:
-    bool DownloadFile(const QString&, const QString&) override { return false; }
+    using Downloader::DownloadFile;
+    bool DownloadFile(const QString&, const QString&, const DownloadWatch&) override {
+        return false;
+    }
 };
 
 class NoRegistry final : public Registry {
