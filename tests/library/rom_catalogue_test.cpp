@@ -27,10 +27,10 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
     const auto refreshed = [&](const QStringList& folders, const QString& pattern,
                                const QString& search) -> QString {
         std::vector<std::pair<qint64, qint64>> calls;
-        RomRows rows = catalogue.refresh(folders, pattern, search, [&](qint64 done, qint64 all) {
-            calls.emplace_back(done, all);
-        });
-        EXPECT_EQ(catalogue.narrow(search), rows); // the same, as typed
+        RomRows rows =
+            catalogue.refresh(folders, pattern, {.search = search},
+                              [&](qint64 done, qint64 all) { calls.emplace_back(done, all); });
+        EXPECT_EQ(catalogue.narrow({.search = search}), rows); // the same, as typed
         if (calls.empty())
             return "no progress";
         model.clear(); // as the window does once the folders are listed
