@@ -169,6 +169,8 @@ void frmMain::createMenus() {
     separator(mnuSettings, "mnuBar5");
     mnuSearchAsYouType = item(mnuSettings, "mnuSearchAsYouType", "Search &As You Type");
     mnuSearchAsYouType->setCheckable(true);
+    mnuFavouritesOnly = item(mnuSettings, "mnuFavouritesOnly", "&Favourites Only");
+    mnuFavouritesOnly->setCheckable(true);
 
     mnuAbout = menu(menuBar()->addMenu(QStringLiteral("&About")), "mnuAbout");
     mnuAboutz26Readme = item(mnuAbout, "mnuAboutz26Readme", "z26 &Readme");
@@ -183,12 +185,16 @@ void frmMain::createMenus() {
     mnuMainRefresh = item(mnuMainPopup, "mnuMainRefresh", "Refresh");
     mnuMainGameInfo = item(mnuMainPopup, "mnuMainGameInfo", "Game Info");
     mnuMainGameInfo->setVisible(false);
+    mnuMainFavourite = item(mnuMainPopup, "mnuMainFavourite", "Add to Favourites");
+    mnuMainFavourite->setVisible(false);
 
     connect(mnuFileExit, &QAction::triggered, this, &frmMain::mnuFileExit_Click);
     connect(mnuSettingsConfiguration, &QAction::triggered, this,
             &frmMain::mnuSettingsConfiguration_Click);
     connect(mnuMainRefresh, &QAction::triggered, this, &frmMain::mnuMainRefresh_Click);
     connect(mnuMainGameInfo, &QAction::triggered, this, &frmMain::mnuMainGameInfo_Click);
+    connect(mnuMainFavourite, &QAction::triggered, this, &frmMain::mnuMainFavourite_Click);
+    connect(mnuFavouritesOnly, &QAction::triggered, this, &frmMain::mnuFavouritesOnly_Click);
     connect(mnuBackColorChange, &QAction::triggered, this, &frmMain::mnuBackColorChange_Click);
     connect(mnuTextColor, &QAction::triggered, this, &frmMain::mnuTextColor_Click);
     connect(mnuBackImgChange, &QAction::triggered, this, &frmMain::mnuBackImgChange_Click);
@@ -283,6 +289,9 @@ void frmMain::Form_Load() {
     vbalListViewCtl1->setForeColor(read(store, stored::textColor));
     ApplyBackground();
     mnuSearchAsYouType->setChecked(read(store, stored::searchAsYouType));
+    mnuFavouritesOnly->setChecked(read(store, stored::favouritesOnly));
+    const QStringList favourites = readFavourites(store);
+    m_favourites = QSet<QString>(favourites.begin(), favourites.end());
 
     const QString z26Path = storedOrFoundZ26Path();
     const bool bRomPath = !readRomFolders(store).empty();
@@ -399,11 +408,10 @@ void frmMain::RefreshMainList() {
     // Painted while the folders are read, but no key or click starts anything meanwhile.
     const auto paint = [] { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); };
     RomRows rows = m_catalogue.refresh(enabledRomFolders(store), read(store, stored::romFilter),
-                                       read(store, stored::romSubfolders), search, progress, paint);
-    const qint64 listed = rows.listed;
-    m_listModel->setRows(std::move(rows.folders), std::move(rows.names),
-                         std::move(rows.rowFolders));
-    setWindowTitle(refreshCaption(m_bInitialLoad, m_listModel->rowCount(), listed));
+                                       read(store, stored::romSubfolders), listFilter(search),
+                                       progress, paint);
+    m_shownSearch = search;
+    showRows(std::move(rows), m_bInitialLoad);
 
     fraSearch->setTitle(QStringLiteral("Only show filenames containing..."));
     vbalProgressBar1->hide();
@@ -541,13 +549,26 @@ void frmMain::txtSearch_Change() {
 }
 
 void frmMain::tmrSearch_Timer() {
-    std::optional<RomRows> rows = m_catalogue.narrow(txtSearch->text().trimmed());
+    showNarrowed(txtSearch->text().trimmed());
+}
+
+void frmMain::showNarrowed(const QString& search) {
+    std::optional<RomRows> rows = m_catalogue.narrow(listFilter(search));
     if (!rows)
         return; // nothing listed yet
-    const qint64 listed = rows->listed;
-    m_listModel->setRows(std::move(rows->folders), std::move(rows->names),
-                         std::move(rows->rowFolders));
-    setWindowTitle(refreshCaption(false, m_listModel->rowCount(), listed));
+    m_shownSearch = search;
+    showRows(std::move(*rows), false);
+}
+
+void frmMain::showRows(RomRows rows, bool bFirstLoad) {
+    const qint64 listed = rows.listed;
+    m_listModel->setRows(std::move(rows.folders), std::move(rows.names), std::move(rows.rowFolders),
+                         std::move(rows.favourite));
+    setWindowTitle(refreshCaption(bFirstLoad, m_listModel->rowCount(), listed));
+}
+
+RowFilter frmMain::listFilter(const QString& search) const {
+    return {search, m_favourites, mnuFavouritesOnly->isChecked()};
 }
 
 void frmMain::vbalListViewCtl1_KeyDown(int key) {
@@ -563,10 +584,39 @@ void frmMain::vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPo
 }
 
 void frmMain::showRowPopup(QPoint globalPos) {
+    const QString path = selectedRowPath();
     mnuMainGameInfo->setVisible(false);
-    if (const QString path = selectedRowPath(); !path.isEmpty() && LookupSoftwareID(path) != 0)
+    if (!path.isEmpty() && LookupSoftwareID(path) != 0)
         mnuMainGameInfo->setVisible(true);
+    mnuMainFavourite->setVisible(!path.isEmpty());
+    mnuMainFavourite->setText(m_favourites.contains(path) ? QStringLiteral("Remove from Favourites")
+                                                          : QStringLiteral("Add to Favourites"));
     mnuMainPopup->popup(globalPos);
+}
+
+void frmMain::mnuMainFavourite_Click() {
+    const int row = vbalListViewCtl1->selectedRow();
+    const QString path = m_listModel->rowPath(row);
+    if (path.isEmpty())
+        return;
+    const bool bFavourite = !m_favourites.contains(path);
+    if (bFavourite)
+        m_favourites.insert(path);
+    else
+        m_favourites.remove(path);
+    QStringList roms(m_favourites.begin(), m_favourites.end());
+    roms.sort();
+    writeFavourites(m_platform.store, roms);
+    if (!bFavourite && mnuFavouritesOnly->isChecked())
+        showNarrowed(m_shownSearch); // the row leaves the list
+    else
+        m_listModel->setFavourite(row, bFavourite);
+}
+
+void frmMain::mnuFavouritesOnly_Click() {
+    // The action has already flipped its check mark when it is triggered from the menu.
+    write(m_platform.store, stored::favouritesOnly, mnuFavouritesOnly->isChecked());
+    showNarrowed(m_shownSearch);
 }
 
 void frmMain::mnuMainGameInfo_Click() {

@@ -8,6 +8,7 @@
 #include <QImage>
 #include <QMainWindow>
 #include <QPointer>
+#include <QSet>
 
 #include <memory>
 #include <optional>
@@ -96,6 +97,7 @@ private:
     QAction* mnuBackColorChange = nullptr;
     QAction* mnuBackImgEnabled = nullptr;
     QAction* mnuSearchAsYouType = nullptr;
+    QAction* mnuFavouritesOnly = nullptr;
     QMenu* mnuAbout = nullptr;
     QAction* mnuAboutz26Readme = nullptr;
     QAction* mnuAboutCopying = nullptr;
@@ -105,6 +107,7 @@ private:
     QMenu* mnuMainPopup = nullptr;
     QAction* mnuMainRefresh = nullptr;
     QAction* mnuMainGameInfo = nullptr;
+    QAction* mnuMainFavourite = nullptr;
 
     bool m_bInitialLoad = false;
 
@@ -116,9 +119,14 @@ private:
     // Narrows the list to what the search box matches among the rows the last refresh
     // listed, without reading a folder.
     void tmrSearch_Timer();
+    // The last listing again, kept by `search` and the favourites, without reading a folder.
+    void showNarrowed(const QString& search);
+    void showRows(RomRows rows, bool bFirstLoad);
+    RowFilter listFilter(const QString& search) const;
     void vbalListViewCtl1_KeyDown(int key);
     void vbalListViewCtl1_MouseDown(Qt::MouseButton button, QPoint globalPos);
-    // The row popup at a place on the screen, with Game Info when the row is known.
+    // The row popup at a place on the screen, with Game Info when the row is known and the
+    // favourite item captioned by the row's state.
     void showRowPopup(QPoint globalPos);
 
     void createControls();
@@ -138,6 +146,9 @@ private:
     void mnuSettingsConfiguration_Click();
     void mnuMainRefresh_Click();
     void mnuMainGameInfo_Click();
+    // Adds the selected row to the favourites, or removes it.
+    void mnuMainFavourite_Click();
+    void mnuFavouritesOnly_Click();
     void mnuBackColorChange_Click();
     void mnuTextColor_Click();
     void mnuBackImgChange_Click();
@@ -176,6 +187,10 @@ private:
     std::optional<EmulatorOptions> m_startOptions;
     std::optional<std::pair<QString, QString>> m_configCaption;
     RomCatalogue m_catalogue;
+    // The favourite ROMs' full paths, as stored.
+    QSet<QString> m_favourites;
+    // The search the shown rows were kept by: the box may hold one not yet applied.
+    QString m_shownSearch;
     std::unique_ptr<CCRC32> mcrc32;
     QImage m_backdrop; // picBack's built-in picture
     bool m_menuIconsAssigned = false;

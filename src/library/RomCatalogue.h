@@ -3,6 +3,7 @@
 #include "library/FileLister.h"
 #include "library/NameList.h"
 
+#include <QSet>
 #include <QString>
 #include <QStringList>
 
@@ -18,8 +19,18 @@ struct RomRows {
     std::vector<int> rowFolders;
     // Every name the folders listed, matched or not.
     qint64 listed = 0;
+    // Whether row i is a favourite; empty when no favourite is known.
+    std::vector<bool> favourite;
 
     bool operator==(const RomRows&) const = default;
+};
+
+// Which listed rows to keep: those the search matches (all for an empty one) and, with
+// onlyFavourites, only the favourites among them. Favourites are full paths.
+struct RowFilter {
+    QString search;
+    QSet<QString> favourites = {};
+    bool onlyFavourites = false;
 };
 
 // How far a refresh is: `done` of `total` names looked at.
@@ -42,20 +53,19 @@ public:
     void dropPrefetch();
 
     // Lists each folder once (with `bSubfolders`, each folder below it too, as a folder of
-    // its own) and keeps the names the search matches, all of them for an
-    // empty search. The folders are read on another thread; `whileListing`, when given, is
-    // called once before and then about every 16 ms until they are read. `progress` is
-    // called with done 0 once every folder is listed, then at least every thousandth of the
-    // names while a search is matched (without one, the names are taken whole at once), and
-    // last with done equal to total.
+    // its own) and keeps the names the filter keeps, flagging the favourites. The folders are
+    // read on another thread; `whileListing`, when given, is called once before and then
+    // about every 16 ms until they are read. `progress` is called with done 0 once every
+    // folder is listed, then at least every thousandth of the names while a search or the
+    // favourites are matched (else the names are taken whole at once), and last with done
+    // equal to total.
     RomRows refresh(const QStringList& folders, const QString& pattern, bool bSubfolders,
-                    const QString& search, const RefreshProgress& progress,
+                    const RowFilter& filter, const RefreshProgress& progress,
                     const std::function<void()>& whileListing = {});
 
-    // The rows of the last refresh's listing, before its search, that `search` matches (all
-    // of them for an empty one), in one pass over the names and without reading a folder;
-    // nothing before the first refresh.
-    std::optional<RomRows> narrow(const QString& search) const;
+    // The rows of the last refresh's listing, before its filter, that `filter` keeps, in one
+    // pass over the names and without reading a folder; nothing before the first refresh.
+    std::optional<RomRows> narrow(const RowFilter& filter) const;
 
 private:
     std::future<std::vector<FolderListing>> m_prefetch;

@@ -28,8 +28,11 @@ int RomListModel::columnCount(const QModelIndex& parent) const {
 QVariant RomListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || index.row() >= rowCount())
         return QVariant();
-    if (index.column() == 0 && role == Qt::DisplayRole)
+    if (index.column() == 0 && role == Qt::DisplayRole) {
+        if (isFavourite(index.row()))
+            return QStringLiteral("\u2605 ") + readableName(m_names.at(index.row()));
         return readableName(m_names.at(index.row()));
+    }
     // The folder's whole path also as a tip: the column shows it cut in the middle.
     if (index.column() == 1 && (role == Qt::DisplayRole || role == Qt::ToolTipRole))
         return QDir::toNativeSeparators(m_folders[m_rowFolders[static_cast<size_t>(index.row())]]);
@@ -60,16 +63,33 @@ void RomListModel::clear() {
     beginResetModel();
     m_names = NameList();
     m_rowFolders = std::vector<int>();
+    m_favourite = std::vector<bool>();
     m_folders.clear();
     endResetModel();
 }
 
-void RomListModel::setRows(QStringList folders, NameList names, std::vector<int> rowFolders) {
+void RomListModel::setRows(QStringList folders, NameList names, std::vector<int> rowFolders,
+                           std::vector<bool> favourite) {
     beginResetModel();
     m_folders = std::move(folders);
     m_names = std::move(names);
     m_rowFolders = std::move(rowFolders);
+    m_favourite = std::move(favourite);
     endResetModel();
+}
+
+bool RomListModel::isFavourite(int row) const {
+    return row >= 0 && static_cast<size_t>(row) < m_favourite.size() &&
+           m_favourite[static_cast<size_t>(row)];
+}
+
+void RomListModel::setFavourite(int row, bool bFavourite) {
+    if (row < 0 || row >= rowCount() || isFavourite(row) == bFavourite)
+        return;
+    m_favourite.resize(static_cast<size_t>(rowCount()));
+    m_favourite[static_cast<size_t>(row)] = bFavourite;
+    // Only the one name is repainted.
+    emit dataChanged(index(row, 0), index(row, 0), {Qt::DisplayRole});
 }
 
 QString RomListModel::name(int row) const {

@@ -36,8 +36,14 @@ public:
     const std::vector<Column>& columns() const { return m_columns; }
 
     void clear();
-    // Row i is names[i], found in folders[rowFolders[i]].
-    void setRows(QStringList folders, NameList names, std::vector<int> rowFolders);
+    // Row i is names[i], found in folders[rowFolders[i]], a favourite when favourite[i] (none
+    // when favourite is empty).
+    void setRows(QStringList folders, NameList names, std::vector<int> rowFolders,
+                 std::vector<bool> favourite = {});
+
+    // A favourite row's name shows a star; the file name itself stays as it is.
+    bool isFavourite(int row) const;
+    void setFavourite(int row, bool bFavourite);
 
     // A row's file name, or the empty text for a row that does not exist.
     QString name(int row) const;
@@ -48,5 +54,6 @@ private:
     QStringList m_folders;
     NameList m_names;
     std::vector<int> m_rowFolders;
+    std::vector<bool> m_favourite;
     std::vector<Column> m_columns;
 };

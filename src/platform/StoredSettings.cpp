@@ -4,8 +4,10 @@ namespace {
 
 const QString kSettings = QStringLiteral("Settings");
 const QString kRecent = QStringLiteral("Recent");
+const QString kFavourites = QStringLiteral("Favourites");
 
-QString recentKey(int n) {
+// Entry n of a numbered list of ROMs.
+QString romKey(int n) {
     return QStringLiteral("ROM") + QString::number(n);
 }
 
@@ -110,7 +112,7 @@ QStringList enabledRomFolders(const SettingsStore& store) {
 QStringList readRecentRoms(const SettingsStore& store) {
     QStringList roms;
     for (int n = 1; n <= kRecentRomCount; ++n) {
-        const QString rom = store.GetSetting(kRecent, recentKey(n));
+        const QString rom = store.GetSetting(kRecent, romKey(n));
         if (rom.isEmpty())
             break;
         roms << rom;
@@ -121,9 +123,9 @@ QStringList readRecentRoms(const SettingsStore& store) {
 void writeRecentRoms(SettingsStore& store, const QStringList& roms) {
     for (int n = 1; n <= kRecentRomCount; ++n) {
         if (n <= roms.size())
-            store.SaveSetting(kRecent, recentKey(n), roms[n - 1]);
+            store.SaveSetting(kRecent, romKey(n), roms[n - 1]);
         else
-            store.DeleteSetting(kRecent, recentKey(n));
+            store.DeleteSetting(kRecent, romKey(n));
     }
 }
 
@@ -131,4 +133,23 @@ QStringList withRecentRom(QStringList roms, const QString& rom) {
     roms.removeAll(rom);
     roms.prepend(rom);
     return roms.mid(0, kRecentRomCount);
+}
+
+QStringList readFavourites(const SettingsStore& store) {
+    QStringList roms;
+    for (int n = 1;; ++n) {
+        const QString rom = store.GetSetting(kFavourites, romKey(n));
+        if (rom.isEmpty())
+            return roms;
+        roms << rom;
+    }
+}
+
+void writeFavourites(SettingsStore& store, const QStringList& roms) {
+    int n = 1;
+    for (const QString& rom : roms)
+        store.SaveSetting(kFavourites, romKey(n++), rom);
+    // A longer list stored before would otherwise come back at the next start.
+    while (!store.GetSetting(kFavourites, romKey(n)).isEmpty())
+        store.DeleteSetting(kFavourites, romKey(n++));
 }

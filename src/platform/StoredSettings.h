@@ -55,6 +55,8 @@ inline constexpr TextSetting backImg{"Settings", "BackImg", ""};
 inline constexpr BoolSetting backImgEnabled{"Settings", "BackImgEnabled", true};
 // Off: the list keeps its rows while the user types, until Enter.
 inline constexpr BoolSetting searchAsYouType{"Settings", "SearchAsYouType", true};
+// On: the list shows only the favourite ROMs among what the search matches.
+inline constexpr BoolSetting favouritesOnly{"Settings", "FavouritesOnly", false};
 
 inline constexpr PlaceSetting mainWindow{"winpos", {500, 500, 4905, 6570}, true};
 inline constexpr BoolSetting mainWindowMaximized{"winpos", "max", false};
@@ -101,3 +103,9 @@ QStringList readRecentRoms(const SettingsStore& store);
 void writeRecentRoms(SettingsStore& store, const QStringList& roms);
 // The list with `rom` on top, once, and no more than kRecentRomCount entries.
 QStringList withRecentRom(QStringList roms, const QString& rom);
+
+// The favourite ROMs by full path, kept as "Favourites" ROM1..ROMn up to the first empty or
+// missing entry.
+QStringList readFavourites(const SettingsStore& store);
+// Writes the list and removes the entries that followed it.
+void writeFavourites(SettingsStore& store, const QStringList& roms);

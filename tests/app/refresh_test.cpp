@@ -122,3 +122,62 @@ TEST_F(MainWindow, SearchAsYouTypeNarrowsTheLastListing) {
               "of 4 | K.bin, Pa.bin, Pl.bin, Px.bin\nlum - 4 Matches out of 4 | K.bin, Pa.bin, "
               "Pl.bin, Px.bin / lum - 1 Match out of 4 | K.bin False");
 }
+
+// Favourites are marked from the row popup by full path, starred, kept across a restart and,
+// with Settings' item, all the list shows of what the search keeps, typed or entered.
+TEST_F(MainWindow, FavouritesFromThePopupSurviveARestartAndNarrowTheList) {
+    storePaths({"Pa.bin", "Pl.bin", "K.bin"});
+    storeFolder(2, "more", {"Pa.bin"});
+    load();
+    const auto popup = [this](int row) { // the row's popup: its favourite item's caption
+        list()->setCurrentIndex(window->listModel().index(row, 0));
+        QTest::keyClick(list(), Qt::Key_Menu);
+        control<QMenu>(*window, "mnuMainPopup")->hide();
+        return action("mnuMainFavourite")->text() + " | ";
+    };
+    const auto shown = [this] { // as the Name column shows the rows
+        QStringList names;
+        for (int row = 0; row < window->listModel().rowCount(); ++row)
+            names << window->listModel().index(row, 0).data().toString();
+        return window->windowTitle() + " | " + names.join(", ");
+    };
+    const auto search = [this](const QString& text, bool bEnter) {
+        auto* box = control<QLineEdit>(*window, "txtSearch");
+        box->setText(text);
+        if (bEnter)
+            QTest::keyClick(box, Qt::Key_Return);
+        EXPECT_TRUE(
+            QTest::qWaitFor([&] { return !control<QTimer>(*window, "tmrSearch")->isActive(); }));
+    };
+    QStringList seen{popup(1)};
+    action("mnuMainFavourite")->trigger();
+    seen << popup(1);
+    seen.last() += popup(0);
+    action("mnuMainFavourite")->trigger();
+    reload();
+    seen << shown();
+    action("mnuFavouritesOnly")->trigger();
+    seen << shown();
+    search("p", true);
+    seen << shown();
+    search("k OR pl", false);
+    seen << shown();
+    seen.last() += " | " + popup(0);
+    action("mnuMainFavourite")->trigger();
+    seen << shown();
+    action("mnuFavouritesOnly")->trigger();
+    seen << shown();
+    action("mnuFavouritesOnly")->trigger();
+    reload();
+    seen << shown() + " | " + stored("ROM1", "Favourites").replace(fake.root(), "~") +
+                stored("ROM2", "Favourites") + ' ' + stored("FavouritesOnly");
+    EXPECT_EQ(seen.join('\n'),
+              "Add to Favourites | \nRemove from Favourites | Add to Favourites | \n"
+              "lum - 4 ROM's Found | \u2605 K.bin, \u2605 Pa.bin, Pl.bin, Pa.bin\n"
+              "lum - 2 Matches out of 4 | \u2605 K.bin, \u2605 Pa.bin\n"
+              "lum - 1 Match out of 4 | \u2605 Pa.bin\n"
+              "lum - 1 Match out of 4 | \u2605 K.bin | Remove from Favourites | \n"
+              "lum - 0 Matches out of 4 | \n"
+              "lum - 2 Matches out of 4 | K.bin, Pl.bin\n"
+              "lum - 1 ROM Found | \u2605 Pa.bin | ~/roms/Pa.bin<missing> True");
+}

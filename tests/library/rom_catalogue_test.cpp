@@ -31,9 +31,9 @@ TEST(RomCatalogue, ListsTheFoldersInOrderAndKeepsWhatTheSearchMatches) {
                                const QString& search) -> QString {
         std::vector<std::pair<qint64, qint64>> calls;
         RomRows rows =
-            catalogue.refresh(folders, pattern, false, search,
+            catalogue.refresh(folders, pattern, false, {.search = search},
                               [&](qint64 done, qint64 all) { calls.emplace_back(done, all); });
-        EXPECT_EQ(catalogue.narrow(search), rows); // the same, as typed
+        EXPECT_EQ(catalogue.narrow({.search = search}), rows); // the same, as typed
         if (calls.empty())
             return "no progress";
         model.clear(); // as the window does once the folders are listed
@@ -90,7 +90,7 @@ TEST(RomCatalogue, ListsSubfoldersOnlyWhenAskedEachOnceWithItsOwnFolder) {
     RomCatalogue catalogue;
     const auto listed = [&](const QStringList& folders, bool bSubfolders) {
         catalogue.prefetch(folders, "*.bin", !bSubfolders); // for the other choice: not taken
-        const RomRows rows = catalogue.refresh(folders, "*.bin", bSubfolders, "", {});
+        const RomRows rows = catalogue.refresh(folders, "*.bin", bSubfolders, {}, {});
         QStringList shown;
         for (qsizetype i = 0; i < rows.names.size(); ++i)
             shown << QDir(root).relativeFilePath(rows.folders[rows.rowFolders[size_t(i)]]) + ": " +
