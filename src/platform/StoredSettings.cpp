@@ -1,5 +1,7 @@
 #include "platform/StoredSettings.h"
 
+#include <climits>
+
 namespace {
 
 const QString kSettings = QStringLiteral("Settings");
@@ -109,10 +111,13 @@ QStringList enabledRomFolders(const SettingsStore& store) {
     return paths;
 }
 
-QStringList readRecentRoms(const SettingsStore& store) {
+namespace {
+
+// A numbered list of ROMs (ROM1, ROM2, ...) in its own section, read up to its first gap.
+QStringList readRomList(const SettingsStore& store, const QString& section, int most) {
     QStringList roms;
-    for (int n = 1; n <= kRecentRomCount; ++n) {
-        const QString rom = store.GetSetting(kRecent, romKey(n));
+    for (int n = 1; n <= most; ++n) {
+        const QString rom = store.GetSetting(section, romKey(n));
         if (rom.isEmpty())
             break;
         roms << rom;
@@ -120,13 +125,24 @@ QStringList readRecentRoms(const SettingsStore& store) {
     return roms;
 }
 
+// Writes the list and deletes the entries after it: those of a longer list stored before
+// would otherwise come back at the next start. `most` keys are always cleared.
+void writeRomList(SettingsStore& store, const QString& section, const QStringList& roms, int most) {
+    int n = 1;
+    for (const QString& rom : roms)
+        store.SaveSetting(section, romKey(n++), rom);
+    for (; n <= most || !store.GetSetting(section, romKey(n)).isEmpty(); ++n)
+        store.DeleteSetting(section, romKey(n));
+}
+
+} // namespace
+
+QStringList readRecentRoms(const SettingsStore& store) {
+    return readRomList(store, kRecent, kRecentRomCount);
+}
+
 void writeRecentRoms(SettingsStore& store, const QStringList& roms) {
-    for (int n = 1; n <= kRecentRomCount; ++n) {
-        if (n <= roms.size())
-            store.SaveSetting(kRecent, romKey(n), roms[n - 1]);
-        else
-            store.DeleteSetting(kRecent, romKey(n));
-    }
+    writeRomList(store, kRecent, roms.mid(0, kRecentRomCount), kRecentRomCount);
 }
 
 QStringList withRecentRom(QStringList roms, const QString& rom) {
@@ -136,20 +152,9 @@ QStringList withRecentRom(QStringList roms, const QString& rom) {
 }
 
 QStringList readFavourites(const SettingsStore& store) {
-    QStringList roms;
-    for (int n = 1;; ++n) {
-        const QString rom = store.GetSetting(kFavourites, romKey(n));
-        if (rom.isEmpty())
-            return roms;
-        roms << rom;
-    }
+    return readRomList(store, kFavourites, INT_MAX);
 }
 
 void writeFavourites(SettingsStore& store, const QStringList& roms) {
-    int n = 1;
-    for (const QString& rom : roms)
-        store.SaveSetting(kFavourites, romKey(n++), rom);
-    // A longer list stored before would otherwise come back at the next start.
-    while (!store.GetSetting(kFavourites, romKey(n)).isEmpty())
-        store.DeleteSetting(kFavourites, romKey(n++));
+    writeRomList(store, kFavourites, roms, 0);
 }
