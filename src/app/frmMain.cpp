@@ -151,8 +151,10 @@ void frmMain::createMenus() {
     mnuFileSaveSettings = item(mnuFile, "mnuFileSaveSettings", "&Save Settings");
     mnuFileRecent = menu(mnuFile->addMenu(QStringLiteral("&Recent ROMs")), "mnuFileRecent");
     mnuFileRecent->setToolTipsVisible(true);
-    connect(mnuFileRecent, &QMenu::aboutToShow, this, &frmMain::fillRecentMenu);
-    fillRecentMenu();
+    connect(mnuFileRecent, &QMenu::aboutToShow, this, [this] { fillRecentMenu(true); });
+    // Whether each file is still there is asked when the menu opens: a ROM on a slow or
+    // unplugged disk must not hold up the start.
+    fillRecentMenu(false);
     separator(mnuFile, "mnuBar3");
     mnuFileExit = item(mnuFile, "mnuFileExit", "E&xit");
 
@@ -211,7 +213,7 @@ void frmMain::createMenus() {
             [this] { settingsWindow().saveOptionSetFromMenu(); });
 }
 
-void frmMain::fillRecentMenu() {
+void frmMain::fillRecentMenu(bool bCheckFiles) {
     // Not clear(): an item of this menu may be the one whose click runs this.
     for (QAction* old : mnuFileRecent->actions()) {
         mnuFileRecent->removeAction(old);
@@ -227,7 +229,7 @@ void frmMain::fillRecentMenu() {
         // No status bar to show a status tip: the folder shows as the item's tip too.
         action->setStatusTip(QDir::toNativeSeparators(rom.absolutePath()));
         action->setToolTip(action->statusTip());
-        action->setEnabled(rom.isFile());
+        action->setEnabled(!bCheckFiles || rom.isFile());
         const QString path = roms[n];
         connect(action, &QAction::triggered, this, [this, path] { launchRom(path, false); });
     }
@@ -237,7 +239,7 @@ void frmMain::fillRecentMenu() {
     clear->setEnabled(!roms.isEmpty());
     connect(clear, &QAction::triggered, this, [this] {
         writeRecentRoms(m_platform.store, {});
-        fillRecentMenu();
+        fillRecentMenu(true);
     });
 }
 

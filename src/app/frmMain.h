@@ -138,8 +138,9 @@ private:
     void loadStartOptions();
     // The stored z26 path, or a z26 on PATH, stored then.
     QString storedOrFoundZ26Path();
-    // The Recent ROMs menu from the stored list; a ROM that is gone shows disabled.
-    void fillRecentMenu();
+    // The Recent ROMs menu from the stored list; with bCheckFiles a ROM that is gone shows
+    // disabled.
+    void fillRecentMenu(bool bCheckFiles);
     void Form_Resize();
     void Form_Unload();
     void mnuFileExit_Click();

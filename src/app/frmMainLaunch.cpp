@@ -110,7 +110,7 @@ frmMain::Launch frmMain::launchRom(const QString& romFile, bool ForceLoad) {
         }
         writeRecentRoms(m_platform.store, withRecentRom(readRecentRoms(m_platform.store),
                                                         QFileInfo(romFile).absoluteFilePath()));
-        fillRecentMenu();
+        fillRecentMenu(true);
         if (!m_commandLineRom.isEmpty())
             emit commandLineDone(0);
         return Launch::Started;
